@@ -1,0 +1,209 @@
+// SPDX-License-Identifier: MIT
+#pragma once
+
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "ostinet/DeviceObject.h"
+#include "ostinet/Endpoint.h"
+#include "ostinet/TimeStamp.h"
+#include "ostinet/core/Files.h"
+#include "ostinet/core/SortedVector.h"
+
+namespace Ostinet {
+struct PatchNumbers {
+  unsigned char program, msb, lsb;
+  PatchNumbers();
+  PatchNumbers(unsigned char, unsigned char, unsigned char);
+};
+class Names {
+ public:
+  enum Type {
+    kNoNames = 0,
+    kMasterNames = 1,
+    kStandardModeNames = 2,
+    kOverrideNames = 3,
+    kEditedOverrideNames = 4
+  };
+  Names();
+  Names(Type, FileSpecification const&);
+  Names(Type, FileSpecification const&, UString const& name);
+  bool Exists() const;
+  Type GetType() const;
+  FileSpecification const& GetFile() const;
+  UString const& GetName() const;
+  bool operator==(Names const&) const;
+  bool operator!=(Names const&) const;
+};
+class NamesCatalog {
+ public:
+  static NamesCatalog& Instance();
+  Names FindMaster(UString const& manufacturer, UString const& model);
+  void FindMasters(UString const& manufacturer, UString const& model, std::vector<Names>& out);
+  void FindOverrides(UString const& manufacturer, UString const& model, std::vector<Names>& out);
+  Names FindStandardMode(UString const& name);
+  void FindStandardModes(std::vector<Names>& out);
+};
+class NoteNameList;
+class ControlList;
+class DestinationMode : public Object {
+ public:
+  static const MatchObjectID kObjectID = MatchObjectID(5);
+  static DestinationMode const kNoDestinationMode;
+  DestinationMode();
+  DestinationMode(RCPtrMT<Impl::DestModeImpl> const&);
+  Destination GetDestination() const;
+  DestinationNameSet GetNameSet(short channel) const;
+  bool IsStandardMode() const;
+  bool SelectableWithMIDI() const;
+  void GetEnablingCommand(DataBuffer&, TimeStamp, unsigned char deviceID) const;
+  void GetDisablingCommand(DataBuffer&, TimeStamp, unsigned char deviceID) const;
+};
+class DestinationNameSet : public Object {
+ public:
+  static const MatchObjectID kObjectID = MatchObjectID(6);
+  static DestinationNameSet const kNoDestinationNameSet;
+  DestinationNameSet();
+  DestinationNameSet(RCPtrMT<Impl::DestNameSetImpl> const&);
+  Destination GetDestination() const;
+  int CountBanks() const;
+  PatchBank GetBank(int index) const;
+  PatchBank GetBank(unsigned char msb, unsigned char lsb) const;
+  int CountModes() const;
+  std::pair<DestinationMode, unsigned short> GetMode(int index) const;
+  unsigned short GetChannels() const;
+};
+class PatchBank : public Object {
+ public:
+  static const MatchObjectID kObjectID = MatchObjectID(7);
+  static PatchBank const kNoPatchBank;
+  PatchBank();
+  PatchBank(RCPtrMT<Impl::PatchBankImpl> const&);
+  DestinationNameSet GetNameSet() const;
+  UString GetBankName() const;
+  int CountPatches() const;
+  Patch GetPatch(int index) const;
+  unsigned char GetController0Number() const;
+  unsigned char GetController32Number() const;
+  DataBuffer GetCommand(TimeStamp, short channel, unsigned char deviceID) const;
+};
+class Patch : public Object {
+ public:
+  static const MatchObjectID kObjectID = MatchObjectID(7);
+  static Patch const kNoPatch;
+  Patch();
+  Patch(RCPtrMT<Impl::PatchImpl> const&);
+  PatchBank GetBank() const;
+  UString GetNumber() const;
+  UString GetNumberAndName() const;
+  unsigned char GetProgramChange() const;
+  PatchNumbers GetPatchNumbers() const;
+  DataBuffer GetCommand(TimeStamp, short channel, unsigned char deviceID) const;
+  NoteNameList GetNoteNames() const;
+  ControlList GetControlNames() const;
+};
+struct NoteGroup {
+  int id;
+  UString name;
+  std::vector<unsigned char> pitches;
+  NoteGroup();
+};
+class NoteNameListBase : public Object {
+ public:
+  virtual UString GetName() const;
+  virtual ~NoteNameListBase();
+  virtual bool HasNames() const;
+  virtual int CountNoteNames() const;
+  virtual std::pair<unsigned char, UString> GetNoteName(int) const;
+  virtual int CountNoteGroups() const;
+  virtual NoteGroup GetNoteGroup(int) const;
+  virtual NoteGroup GetNoteGroupForID(int) const;
+  virtual UString GetNoteNameForPitch(unsigned char) const;
+  virtual int GetNoteGroupForPitch(unsigned char) const;
+
+ protected:
+  NoteNameListBase();
+  explicit NoteNameListBase(RCPtrMT<Impl::ObjectImpl> const&);
+};
+class NoteNameList : public NoteNameListBase {
+ public:
+  static const MatchObjectID kObjectID = MatchObjectID(9);
+  static NoteNameList const kNoNoteNameList;
+  NoteNameList();
+  NoteNameList(RCPtrMT<Impl::PatchImpl> const&);
+  Patch GetPatch() const;
+  void SetNoteName(unsigned char pitch, UString const& name) const;
+  void ClearNoteName(unsigned char pitch) const;
+  void PutNoteInGroup(unsigned char pitch, int groupID, UString const& groupName) const;
+  void RemoveNoteGroup(int groupID, bool removeNotes) const;
+  int GetUnusedGroupID() const;
+};
+class DefaultNoteNameList : public NoteNameListBase {
+ public:
+  static const MatchObjectID kObjectID = MatchObjectID(10);
+  static DefaultNoteNameList const kNoDefaultNoteNameList;
+  DefaultNoteNameList();
+  DefaultNoteNameList(RCPtrMT<Impl::DestNameSetImpl> const&);
+  DestinationNameSet GetNameSet() const;
+};
+enum ControlType : int {};
+class Control {
+ public:
+  typedef sorted_vector_map<unsigned short, UString, std::less<unsigned short> > ValueMap;
+  Control();
+  Control(ControlType, unsigned short number, UString const& name);
+  Control(ControlType, unsigned short, UString const&, double min, double max);
+  Control(ControlType, unsigned short, UString const&, double min, double max,
+          UString const& units);
+  Control(ControlType, unsigned short, UString const&, double min, double max, double dflt);
+  Control(ControlType, unsigned short, UString const&, double min, double max, double dflt,
+          UString const& units);
+  Control(ControlType, unsigned short, UString const&, ValueMap const&);
+  Control(ControlType, unsigned short, UString const&, ValueMap const&, unsigned short dflt);
+  ControlType GetType() const;
+  unsigned short GetNumber() const;
+  UString GetName() const;
+  double GetMinValue() const;
+  double GetMaxValue() const;
+  double GetDefaultValue() const;
+  UString GetUnits() const;
+  bool HasValueRange() const;
+  bool HasDefaultValue() const;
+  bool HasUnits() const;
+  int CountValueNames() const;
+  std::pair<unsigned short, UString> GetValueName(int) const;
+  UString GetNameForValue(unsigned short) const;
+};
+class ControlListBase : public Object {
+ public:
+  virtual UString GetName() const;
+  virtual ~ControlListBase();
+  virtual int CountControls() const;
+  virtual Control GetControl(ControlType, unsigned short) const;
+  virtual Control GetControl(int) const;
+  virtual bool HasControl(ControlType, unsigned short) const;
+
+ protected:
+  ControlListBase();
+  explicit ControlListBase(RCPtrMT<Impl::ObjectImpl> const&);
+};
+class ControlList : public ControlListBase {
+ public:
+  static const MatchObjectID kObjectID = MatchObjectID(11);
+  static ControlList const kNoControlList;
+  ControlList();
+  ControlList(RCPtrMT<Impl::PatchImpl> const&);
+  Patch GetPatch() const;
+  void SetControl(Control const&) const;
+  void ClearControl(ControlType, unsigned short) const;
+};
+class DefaultControlList : public ControlListBase {
+ public:
+  static const MatchObjectID kObjectID = MatchObjectID(12);
+  static DefaultControlList const kNoDefaultControlList;
+  DefaultControlList();
+  DefaultControlList(RCPtrMT<Impl::DestNameSetImpl> const&);
+  DestinationNameSet GetNameSet() const;
+};
+}  // namespace Ostinet
