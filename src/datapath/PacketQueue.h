@@ -41,6 +41,7 @@ class PacketQueue {
 
  private:
   void CollectArrivals();
+  PacketNode* TakeFirst();
 
   alignas(16) void* arrivals_[2] = {nullptr, nullptr};  // a stack: the newest on top
   PacketNode* first_ = nullptr;                         // collected, the oldest first
