@@ -21,8 +21,6 @@ Impl::ImplImpl* SendingPeer(Destination const& handle) {
 
 }  // namespace
 
-Impl::Sender::~Sender() = default;
-
 std::unique_ptr<Impl::Sender> Destination::MakeSender() const {
   Impl::ImplImpl* const peer = SendingPeer(*this);
   return peer != nullptr ? peer->MakeSender(ImplOf(*this)) : nullptr;
