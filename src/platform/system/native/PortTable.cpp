@@ -58,11 +58,12 @@ void TakeNewPort(std::vector<TablePort>& ports, Listed const& listed,
 PortTable::PortTable(std::vector<std::shared_ptr<MidiService>> services)
     : services_(std::move(services)) {}
 
-bool PortTable::Refresh() {
+unsigned PortTable::Refresh() {
   std::scoped_lock refreshing(refreshing_);
   bool const inputs = RefreshDirection(PortDirection::kInput);
   bool const outputs = RefreshDirection(PortDirection::kOutput);
-  return inputs || outputs;
+  if (inputs || outputs) ++changes_;
+  return changes_;
 }
 
 bool PortTable::RefreshDirection(PortDirection direction) {
@@ -95,7 +96,7 @@ unsigned PortTable::Count() const {
   return static_cast<unsigned>(std::max(ports_[0].size(), ports_[1].size()));
 }
 
-std::optional<TablePort> PortTable::Find(PortDirection direction, unsigned number) const {
+std::optional<TablePort> PortTable::Find(PortDirection direction, std::uintptr_t number) const {
   std::scoped_lock lock(mutex_);
   Ports const& ports = PortsOf(direction);
   if (number >= ports.size() || !ports[number].present) return std::nullopt;

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <cstdint>
 #include <memory>
 #include <mutex>
 #include <optional>
@@ -30,14 +31,15 @@ class PortTable {
  public:
   explicit PortTable(std::vector<std::shared_ptr<MidiService>> services);
 
-  /// Asks the services anew; true when what is present, or its names, changed.
-  bool Refresh();
+  /// Asks the services anew. The result is the number of changes so far: a reading that differs
+  /// from an earlier one means that what is present, or its names, changed in between.
+  unsigned Refresh();
 
   /// One more than the highest number, the larger of both directions: every input and every output
   /// is then reached by a scan that takes the number of one direction for both.
   unsigned Count() const;
   /// No value for a number out of range or of a port that is away.
-  std::optional<TablePort> Find(PortDirection direction, unsigned number) const;
+  std::optional<TablePort> Find(PortDirection direction, std::uintptr_t number) const;
   /// In the order of their numbers.
   std::vector<TablePort> Present(PortDirection direction) const;
 
@@ -53,7 +55,8 @@ class PortTable {
   std::vector<std::shared_ptr<MidiService>> const services_;
   std::mutex refreshing_;  // so that an older listing never overwrites a newer; before mutex_
   mutable std::mutex mutex_;
-  Ports ports_[2];  // guarded by mutex_
+  Ports ports_[2];        // guarded by mutex_
+  unsigned changes_ = 0;  // guarded by refreshing_
 };
 
 }  // namespace Ostinet::Impl
