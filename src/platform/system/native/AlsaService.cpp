@@ -124,9 +124,12 @@ class AlsaInputWire : public InputWire {
 
 }  // namespace
 
+// The sequencer is part of the machine: once there, it stays.
 bool AlsaService::IsAlive() {
+  if (isAlive_) return true;
   RtMidiErrors errors;
-  return MakeAlsaMidi<RtMidiIn>(errors) != nullptr;
+  isAlive_ = MakeAlsaMidi<RtMidiIn>(errors) != nullptr;
+  return isAlive_;
 }
 
 std::vector<ServicePort> AlsaService::List(PortDirection direction) {

@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <atomic>
+
 #include "platform/system/native/MidiService.h"
 
 namespace Ostinet::Impl {
@@ -14,6 +16,9 @@ class AlsaService : public MidiService {
   std::unique_ptr<OutputWire> OpenOutput(std::string const& id) override;
   std::unique_ptr<InputWire> OpenInput(std::string const& id, InputSink sink) override;
   void SetChangeHint(std::function<void()>) override {}
+
+ private:
+  std::atomic<bool> isAlive_{false};  // set once, by whoever finds out; orders nothing
 };
 
 }  // namespace Ostinet::Impl

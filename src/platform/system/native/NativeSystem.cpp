@@ -65,7 +65,10 @@ NativeSystem::~NativeSystem() {
   for (auto const& service : services_) service->SetChangeHint(nullptr);
 }
 
-UINT NativeSystem::midiInGetNumDevs() { return ports_->Count(); }
+UINT NativeSystem::midiInGetNumDevs() {
+  ports_->Refresh();
+  return ports_->Count();
+}
 
 MMRESULT NativeSystem::midiInGetDevCapsW(UINT_PTR device, MIDIINCAPSW* caps, UINT size) {
   auto const port = ports_->Find(PortDirection::kInput, device);
@@ -127,7 +130,10 @@ MMRESULT NativeSystem::midiInAddBuffer(HMIDIIN handle, MIDIHDR* header, UINT siz
   return input ? input->AddBuffer(header, size) : MMSYSERR_INVALHANDLE;
 }
 
-UINT NativeSystem::midiOutGetNumDevs() { return ports_->Count(); }
+UINT NativeSystem::midiOutGetNumDevs() {
+  ports_->Refresh();
+  return ports_->Count();
+}
 
 MMRESULT NativeSystem::midiOutGetDevCapsW(UINT_PTR device, MIDIOUTCAPSW* caps, UINT size) {
   auto const port = ports_->Find(PortDirection::kOutput, device);
