@@ -4,6 +4,7 @@
 #include <cstddef>
 
 #include "ostinet/Common.h"
+#include "ostinet/DeviceTypeCatalog.h"
 #include "ostinet/TimeStamp.h"
 
 namespace Ostinet {
@@ -24,6 +25,7 @@ struct MatchEntry {
   unsigned char value;
 };
 namespace Autodetect {
+class Request;
 class Matcher {
  public:
   Matcher(Matcher const&);
