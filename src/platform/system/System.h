@@ -6,6 +6,7 @@
 // call nothing else. Each implementation behind it (windows, simulated, native) is one folder.
 
 #include <memory>
+#include <string>
 #include <vector>
 
 #include "platform/system/WindowsTypes.h"
