@@ -40,18 +40,16 @@ WinMIDISetup::PlatformCreateVirtualEndpoint(UString const& name, int uniqueID, S
   (sourceIsPublic ? Lists().sources : Lists().privateSources).push_back(source);
   (destinationIsPublic ? Lists().destinations : Lists().privateDestinations).push_back(destination);
   MarkChanged();
-  virtualSourcesMutex_.lock();
+  MutexHolder const lock(virtualSourcesMutex_);
   virtualSources_.push_back(source);
-  virtualSourcesMutex_.unlock();
   return {source, destination};
 }
 
 void WinMIDISetup::PlatformDeleteVirtualEndpoint(RCPtrMT<EndpointImpl>& source,
                                                  RCPtrMT<DestinationImpl>&) {
-  virtualSourcesMutex_.lock();
+  MutexHolder const lock(virtualSourcesMutex_);
   virtualSources_.erase(std::remove(virtualSources_.begin(), virtualSources_.end(), source),
                         virtualSources_.end());
-  virtualSourcesMutex_.unlock();
 }
 
 }  // namespace Ostinet::Impl

@@ -4,7 +4,7 @@
 
 #include <algorithm>
 
-#include "core/TimerCalibrator.h"
+#include "core/Time.h"
 #include "datapath/TimeBase.h"
 #include "model/DestinationImpl.h"
 #include "model/PropertyKeys.h"
@@ -29,7 +29,7 @@ WinMIDISetup::WinMIDISetup()
   pollThread_->Start();
   if (OstinetCallbackAPI::gInstance != nullptr) {
     if (auto* const provider = OstinetCallbackAPI::gInstance->GetDevicesProvider()) {
-      provider->Add(*this);
+      provider->AddDependent(*this);
     }
   }
 }
@@ -39,12 +39,12 @@ WinMIDISetup::~WinMIDISetup() {
     SignOut(true);
   }
   // No notification may find the thread half gone.
-  RemoveFromProviders();
+  LeaveProviders();
   pollThread_->Terminate();
 }
 
 std::shared_ptr<Session> WinMIDISetup::GetSession() const {
-  std::lock_guard<std::mutex> const lock(sessionMutex_);
+  MutexHolder const lock(sessionMutex_);
   return session_;
 }
 
@@ -71,14 +71,14 @@ int WinMIDISetup::PlatformSignIn(UString const&) {
 void WinMIDISetup::StartSession() {
   auto session = std::make_shared<Session>(CurrentSystem());
   InstallSession(session);
-  std::lock_guard<std::mutex> const lock(sessionMutex_);
+  MutexHolder const lock(sessionMutex_);
   session_ = std::move(session);
 }
 
 void WinMIDISetup::StopSession() {
   UninstallSession();
   std::shared_ptr<Session> session;
-  std::lock_guard<std::mutex> const lock(sessionMutex_);
+  MutexHolder const lock(sessionMutex_);
   session_.swap(session);
   pollFuture_.reset();
 }
@@ -90,9 +90,10 @@ void WinMIDISetup::PlatformSignOut() {
     }
   }
   activeSources_.clear();
-  virtualSourcesMutex_.lock();
-  virtualSources_.clear();
-  virtualSourcesMutex_.unlock();
+  {
+    MutexHolder const lock(virtualSourcesMutex_);
+    virtualSources_.clear();
+  }
   StopSession();
   pendingChanges_.clear();
 }
@@ -129,26 +130,26 @@ void WinMIDISetup::PropChanged(DeviceObjectImpl* object, UString const& key) {
 }
 
 void WinMIDISetup::DevicesChanged() {
-  std::lock_guard<std::mutex> const lock(sessionMutex_);
+  MutexHolder const lock(sessionMutex_);
   if (session_ == nullptr) {
     return;
   }
   // The newest answer alone is ever collected.
-  pollFuture_ = RunOnThread<PortList>(*pollThread_, [session = session_] {
+  pollFuture_ = pollThread_->Post<PortList>([session = session_] {
     return EnumeratePorts(session->GetSystem(), *session->DirectMusic().get());
   });
 }
 
-boost::optional<PortList> WinMIDISetup::CollectPorts() {
+std::optional<PortList> WinMIDISetup::CollectPorts() {
   std::shared_ptr<VantorFuture<PortList>> future;
   {
-    std::lock_guard<std::mutex> const lock(sessionMutex_);
-    if (pollFuture_ == nullptr || !pollFuture_->IsReady()) {
-      return boost::none;
+    MutexHolder const lock(sessionMutex_);
+    if (pollFuture_ == nullptr || !pollFuture_->IsComplete()) {
+      return std::nullopt;
     }
     future.swap(pollFuture_);
   }
-  return future->Take();
+  return future->Try(0);
 }
 
 bool WinMIDISetup::PlatformPollSetupChanges(bool& connectionsChanged) {
@@ -157,7 +158,7 @@ bool WinMIDISetup::PlatformPollSetupChanges(bool& connectionsChanged) {
     return false;
   }
   connectionsChanged = setupChanged_;
-  if (boost::optional<PortList> const ports = CollectPorts()) {
+  if (std::optional<PortList> const ports = CollectPorts()) {
     PortAttacher attacher(*this, session);
     connectionsChanged |= Reconcile(*this, attacher, *ports);
   }

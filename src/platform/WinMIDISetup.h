@@ -1,14 +1,12 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
-#include <boost/optional.hpp>
 #include <map>
 #include <memory>
-#include <mutex>
+#include <optional>
 
-#include "core/Future.h"
 #include "core/JobThread.h"
-#include "core/Mutexes.h"
+#include "core/Mutex.h"
 #include "model/DeviceObjectImpl.h"
 #include "model/Studio.h"
 #include "ostinet/Setup.h"
@@ -71,19 +69,19 @@ class WinMIDISetup : public Setup, public WinMIDIDevicesListener {
   void MarkOfflinePorts();
   void DrainPorts();
   void DrainVirtualSources();
-  boost::optional<PortList> CollectPorts();
+  std::optional<PortList> CollectPorts();
   /// Hands the collected keys to their objects. True if an object in the studio changed.
   bool HandlePendingChanges(bool& connectionsChanged);
   void DropRemovedSources();
   /// The public end takes the wanted ID if it is free.
   void NameVirtualEnd(EndpointImpl& end, UString const& name, int wantedID, bool isPublic);
 
-  mutable std::mutex sessionMutex_;
-  std::shared_ptr<Session> session_;                    // guarded by sessionMutex_
-  std::shared_ptr<VantorFuture<PortList>> pollFuture_;  // guarded by sessionMutex_
+  mutable VantorCoreMutex sessionMutex_;
+  std::shared_ptr<Session> session_ OSTINET_GUARDED_BY(sessionMutex_);
+  std::shared_ptr<VantorFuture<PortList>> pollFuture_ OSTINET_GUARDED_BY(sessionMutex_);
 
   VantorCoreMutex virtualSourcesMutex_;
-  std::vector<RCPtrMT<EndpointImpl>> virtualSources_;  // guarded by virtualSourcesMutex_
+  std::vector<RCPtrMT<EndpointImpl>> virtualSources_ OSTINET_GUARDED_BY(virtualSourcesMutex_);
 
   std::vector<RCPtrMT<EndpointImpl>> activeSources_;
   PendingChanges pendingChanges_;

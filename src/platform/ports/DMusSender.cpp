@@ -5,8 +5,9 @@
 // A packet is cut behind each status byte but its first, so a sysex is one piece, and a short
 // message is one piece only if it stands alone in its packet: of 90 3C 40 80 3C 00 come the
 // pieces 90 3C 40 80 and 3C 00. A long sysex is cut to what a buffer holds: its first chunk
-// leaves room for the header of 20 bytes and the later ones do not, so no buffer takes those.
-// Hosts know that 236 bytes of a sysex get through and send longer ones in several packets.
+// leaves room for the header of 20 bytes and the later ones, of up to 256 bytes, do not, so one
+// that fills a buffer gets lost. Hosts know the limit of 236 bytes and send longer messages in
+// several packets.
 
 #include "platform/ports/DMusSender.h"
 
@@ -91,6 +92,13 @@ DMusSender::DMusSender(RCPtrMT<ChannelPatchState> tracker, std::shared_ptr<DMusL
     loan_ = BufferPool::Borrow(line_->session->Pool());
   } catch (VantorError const&) {
     // No buffer: CanSend tells.
+  }
+}
+
+DMusSender::~DMusSender() {
+  // What was not flushed is not sent; nor may it reach the port of the next borrower.
+  if (loan_) {
+    loan_->buffer->Flush();
   }
 }
 

@@ -12,6 +12,8 @@ class DMusSender : public TrackingSender {
   /// `line` may be null: the port is closed.
   DMusSender(RCPtrMT<ChannelPatchState> tracker, std::shared_ptr<DMusLine> line);
 
+  ~DMusSender() override;
+
   void Flush() override;
   bool CanSend() const override;
 

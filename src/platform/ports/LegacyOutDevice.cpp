@@ -147,7 +147,7 @@ void LegacyOutDevice::SendPacket(DataPacket const& packet) {
 }
 
 void LegacyOutDevice::Enqueue(DataPacket const& packet) {
-  queueMutex_.lock();
+  MutexHolder const lock(queueMutex_);
   try {
     queue_.PushBack(packet);
     if (!waits_.ReleaseSemaphore(itemsSemaphore_, 1)) {
@@ -156,7 +156,6 @@ void LegacyOutDevice::Enqueue(DataPacket const& packet) {
   } catch (std::bad_alloc const&) {
     // No room for a copy: the packet is lost, as any that cannot go out.
   }
-  queueMutex_.unlock();
 }
 
 void LegacyOutDevice::SendNow(unsigned char const* data, unsigned long long length) {
@@ -218,10 +217,7 @@ bool LegacyOutDevice::WaitForItem() {
 }
 
 bool LegacyOutDevice::WaitForTime(HANDLE timer) {
-  queueMutex_.lock();
-  TimeStamp const stamp = queue_.IsEmpty() ? kNoTimeStamp : queue_.Front().stamp;
-  queueMutex_.unlock();
-  long long const clocks = ClocksUntil(stamp);
+  long long const clocks = ClocksUntil(FrontStamp());
   if (clocks == 0) {
     return true;
   }
@@ -239,15 +235,23 @@ bool LegacyOutDevice::WaitForTime(HANDLE timer) {
 }
 
 void LegacyOutDevice::SendNext(PacketRing::Packet& packet) {
-  queueMutex_.lock();
-  bool const hasPacket = !queue_.IsEmpty();
-  if (hasPacket) {
-    queue_.PopFront(packet);
-  }
-  queueMutex_.unlock();
-  if (hasPacket) {
+  if (TakeFront(packet)) {
     SendNow(packet.bytes.data(), packet.bytes.size());
   }
+}
+
+TimeStamp LegacyOutDevice::FrontStamp() {
+  MutexHolder const lock(queueMutex_);
+  return queue_.IsEmpty() ? kNoTimeStamp : queue_.Front().stamp;
+}
+
+bool LegacyOutDevice::TakeFront(PacketRing::Packet& packet) {
+  MutexHolder const lock(queueMutex_);
+  if (queue_.IsEmpty()) {
+    return false;
+  }
+  queue_.PopFront(packet);
+  return true;
 }
 
 }  // namespace Ostinet::Impl

@@ -5,7 +5,7 @@
 #include <memory>
 #include <thread>
 
-#include "core/Mutexes.h"
+#include "core/Mutex.h"
 #include "ostinet/TimeStamp.h"
 #include "platform/Session.h"
 #include "platform/ports/PacketRing.h"
@@ -49,6 +49,8 @@ class LegacyOutDevice : public std::enable_shared_from_this<LegacyOutDevice> {
   /// False when the wait was cut short because the device closes.
   bool WaitForTime(HANDLE timer);
   void Enqueue(DataPacket const& packet);
+  TimeStamp FrontStamp();
+  bool TakeFront(PacketRing::Packet& packet);
   void StopThread();
   void SendNow(unsigned char const* data, unsigned long long length);
   void SendLong(HMIDIOUT handle, unsigned char const* data, DWORD length);
