@@ -42,9 +42,9 @@ BufferPool::Loan BufferPool::Borrow(std::shared_ptr<BufferPool> const& pool) {
   return Loan(entry, Return{pool});
 }
 
-void BufferPool::Push(Entry* entry) { EnqueueAtomic(head_, entry); }
+void BufferPool::Push(Entry* entry) { EnqueueAtomic(&head_, entry); }
 
-BufferPool::Entry* BufferPool::Pop() { return static_cast<Entry*>(DequeueAtomic(head_)); }
+BufferPool::Entry* BufferPool::Pop() { return static_cast<Entry*>(DequeueAtomic(&head_)); }
 
 std::unique_ptr<BufferPool::Entry> BufferPool::MakeEntry() const {
   auto entry = std::make_unique<Entry>();

@@ -45,7 +45,7 @@ class BufferPool {
   std::unique_ptr<Entry> MakeEntry() const;
 
   ComPtr<IDirectMusic> const directMusic_;
-  alignas(16) void* head_[2] = {nullptr, nullptr};  // the top of the stack
+  void* head_ = nullptr;  // the top of the stack
 };
 
 }  // namespace Ostinet::Impl

@@ -8,6 +8,7 @@
 #include "model/DeviceImpl.h"
 #include "model/EntityImpl.h"
 #include "model/PropertyKeys.h"
+#include "platform/WinMIDIImplImpl.h"
 #include "platform/WinMIDISetup.h"
 
 namespace Ostinet::Impl {

@@ -13,6 +13,7 @@ namespace {
 
 // A collection that lists instruments for ever must not hang the opening.
 constexpr DWORD kMostInstruments = 65536;
+constexpr DWORD kNameUnits = 64;
 
 ComPtr<IDirectMusicCollection> DefaultCollection(IDirectMusicLoader& loader) {
   DMUS_OBJECTDESC description{};
@@ -70,9 +71,9 @@ void WinDMusMIDIOutPort::DownloadDefaultSet() {
     return;
   }
   DWORD patch = 0;
+  WCHAR name[kNameUnits];
   for (DWORD index = 0; index < kMostInstruments; ++index) {
-    WCHAR name[MAX_PATH];
-    if (collection->EnumInstrument(index, &patch, name, MAX_PATH) != S_OK) {
+    if (collection->EnumInstrument(index, &patch, name, kNameUnits) != S_OK) {
       return;
     }
     ComPtr<IDirectMusicInstrument> instrument;

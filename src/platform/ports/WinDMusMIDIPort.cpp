@@ -38,7 +38,6 @@ WinDMusMIDIPort::~WinDMusMIDIPort() {
 }
 
 void WinDMusMIDIPort::Open(DMUS_PORTCAPS const& caps) {
-  caps_ = caps;
   DMusPortName const port = NameOfPort(caps);
   SetString(Keys::kName, port.name);
   if ((caps.dwFlags & (DMUS_PC_DLS | DMUS_PC_GMINHARDWARE)) != 0) {
