@@ -9,25 +9,41 @@ set(CMAKE_VISIBILITY_INLINES_HIDDEN ON)
 set(CMAKE_POSITION_INDEPENDENT_CODE ON)
 set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
 
-option(OSTINET_BUILD_TESTS "Build the tests" ON)
+# Programs and the library lie side by side, so that on Windows each program finds the DLL.
+set(CMAKE_RUNTIME_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/bin)
+set(CMAKE_LIBRARY_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib)
+set(CMAKE_ARCHIVE_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib)
+
+if(NOT CMAKE_BUILD_TYPE AND NOT CMAKE_CONFIGURATION_TYPES)
+  set(CMAKE_BUILD_TYPE Release CACHE STRING "Debug, Release, RelWithDebInfo or MinSizeRel" FORCE)
+endif()
+
+option(OSTINET_BUILD_TESTS "Build the tests" ${PROJECT_IS_TOP_LEVEL})
+option(OSTINET_BUILD_EXAMPLES "Build the example hosts" ${PROJECT_IS_TOP_LEVEL})
 option(OSTINET_BUILD_BENCH "Build the benchmarks" OFF)
-option(OSTINET_WARNINGS_AS_ERRORS "Treat warnings as errors" ON)
+option(OSTINET_BUILD_FUZZ "Build the fuzz targets (clang)" OFF)
+option(OSTINET_WARNINGS_AS_ERRORS "Treat warnings as errors" ${PROJECT_IS_TOP_LEVEL})
 set(OSTINET_SANITIZE "" CACHE STRING "Value for -fsanitize=, empty for none")
 
 find_program(CCACHE_PROGRAM ccache)
 if(CCACHE_PROGRAM AND NOT CMAKE_CXX_COMPILER_LAUNCHER)
-  set(CMAKE_CXX_COMPILER_LAUNCHER ${CCACHE_PROGRAM})
+  # Paths are told relative to the tree, so that clones share what they compiled, and precompiled
+  # headers do not hinder the cache.
+  set(CMAKE_CXX_COMPILER_LAUNCHER ${CMAKE_COMMAND} -E env
+    CCACHE_BASEDIR=${PROJECT_SOURCE_DIR} CCACHE_NOHASHDIR=1
+    CCACHE_SLOPPINESS=pch_defines,time_macros,include_file_mtime,include_file_ctime
+    ${CCACHE_PROGRAM})
 endif()
 
 add_library(ostinet_settings INTERFACE)
 target_compile_options(ostinet_settings INTERFACE
   -Wall -Wextra -Wpedantic -Wshadow -Wconversion
+  $<$<CXX_COMPILER_ID:Clang>:-Wthread-safety>
   $<$<BOOL:${OSTINET_WARNINGS_AS_ERRORS}>:-Werror>)
-if(OSTINET_SANITIZE)
-  target_compile_options(ostinet_settings INTERFACE
-    -fsanitize=${OSTINET_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer)
-  target_link_options(ostinet_settings INTERFACE -fsanitize=${OSTINET_SANITIZE})
-endif()
 
-find_package(Threads REQUIRED)
-find_package(Boost 1.74 REQUIRED)
+# Sanitizers see everything that is compiled here, GoogleTest included.
+if(OSTINET_SANITIZE)
+  add_compile_options(-fsanitize=${OSTINET_SANITIZE} -fno-sanitize-recover=all
+    -fno-omit-frame-pointer)
+  add_link_options(-fsanitize=${OSTINET_SANITIZE})
+endif()

@@ -1,7 +1,16 @@
 # SPDX-License-Identifier: MIT
 # One object target a folder, which links only the folders below it.
 
-define_property(GLOBAL PROPERTY OSTINET_COMPONENTS BRIEF_DOCS "All components" FULL_DOCS "All components")
+define_property(GLOBAL PROPERTY OSTINET_COMPONENTS BRIEF_DOCS "All components")
+
+# ostinet_folders(src/core ...): adds each folder that is there.
+macro(ostinet_folders)
+  foreach(folder IN ITEMS ${ARGN})
+    if(EXISTS ${CMAKE_CURRENT_SOURCE_DIR}/${folder}/CMakeLists.txt)
+      add_subdirectory(${folder})
+    endif()
+  endforeach()
+endmacro()
 
 # ostinet_component(core SOURCES a.cpp b.cpp [DEPENDS other...] [LIBRARIES external...])
 function(ostinet_component name)
@@ -9,7 +18,8 @@ function(ostinet_component name)
   set(target ostinet_${name})
   add_library(${target} OBJECT ${ARG_SOURCES})
   target_compile_definitions(${target} PRIVATE OSTINET_BUILDING)
-  target_include_directories(${target} PUBLIC ${PROJECT_SOURCE_DIR}/include ${PROJECT_SOURCE_DIR}/src)
+  target_include_directories(${target} PUBLIC
+    ${PROJECT_SOURCE_DIR}/include ${PROJECT_SOURCE_DIR}/src)
   list(TRANSFORM ARG_DEPENDS PREPEND ostinet_)
   target_link_libraries(${target} PRIVATE ostinet_settings
     PUBLIC ${ARG_DEPENDS} ${ARG_LIBRARIES} Boost::headers Threads::Threads)
@@ -22,21 +32,24 @@ function(ostinet_library)
   add_library(ostinet SHARED)
   add_library(Ostinet::ostinet ALIAS ostinet)
   add_library(ostinet_internals STATIC)
-  foreach(component IN LISTS components)
-    foreach(library ostinet ostinet_internals)
-      target_sources(${library} PRIVATE $<TARGET_OBJECTS:${component}>)
-    endforeach()
-    target_link_libraries(ostinet PRIVATE $<BUILD_INTERFACE:${component}>)
-    target_link_libraries(ostinet_internals PUBLIC $<BUILD_INTERFACE:${component}>)
-  endforeach()
+  target_link_libraries(ostinet PRIVATE ${components} ostinet_settings PUBLIC Boost::headers)
+  target_link_libraries(ostinet_internals PUBLIC ${components})
   target_include_directories(ostinet PUBLIC
     $<BUILD_INTERFACE:${PROJECT_SOURCE_DIR}/include> $<INSTALL_INTERFACE:include>)
-  target_link_libraries(ostinet PUBLIC Boost::headers PRIVATE ostinet_settings)
   target_compile_definitions(ostinet_internals PUBLIC OSTINET_STATIC)
   set_target_properties(ostinet PROPERTIES VERSION ${PROJECT_VERSION} SOVERSION 0)
+  if(NOT WIN32)
+    set(map ${PROJECT_SOURCE_DIR}/cmake/ostinet.map)
+    target_link_options(ostinet PRIVATE LINKER:--version-script=${map})
+    set_target_properties(ostinet PROPERTIES LINK_DEPENDS ${map})
+    if(NOT OSTINET_SANITIZE)
+      target_link_options(ostinet PRIVATE LINKER:--no-undefined)
+    endif()
+  endif()
 endfunction()
 
-# ostinet_tests(core SOURCES ...): one program a folder; each test runs in a process of its own.
+# ostinet_tests(core SOURCES ... [LIBRARIES ...]): one program a folder; each test runs in a process
+# of its own.
 function(ostinet_tests name)
   cmake_parse_arguments(ARG "" "" "SOURCES;LIBRARIES" ${ARGN})
   set(target ${name}_tests)
@@ -44,5 +57,6 @@ function(ostinet_tests name)
   target_include_directories(${target} PRIVATE ${PROJECT_SOURCE_DIR}/tests)
   target_link_libraries(${target} PRIVATE ostinet_internals ostinet_settings ${ARG_LIBRARIES}
     GTest::gmock_main)
-  gtest_discover_tests(${target} DISCOVERY_MODE PRE_TEST PROPERTIES LABELS ${name} TIMEOUT 120)
+  gtest_discover_tests(${target} DISCOVERY_MODE PRE_TEST DISCOVERY_TIMEOUT 60
+    PROPERTIES LABELS ${name} TIMEOUT 120)
 endfunction()
