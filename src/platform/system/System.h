@@ -6,6 +6,7 @@
 // call nothing else. Each implementation behind it (windows, simulated, native) is one folder.
 
 #include <memory>
+#include <string>
 #include <vector>
 
 #include "platform/system/WindowsTypes.h"
@@ -87,6 +88,14 @@ class System {
   virtual std::vector<AudioSession> SnapshotAudioSessions() = 0;
 
   virtual Waits& GetWaits() = 0;
+
+  /// Calls `changed` on a thread of the system's own after ports came, went or were renamed, until
+  /// the last copy of the result goes; letting go waits for a running call. Null: this system tells
+  /// nothing.
+  virtual std::shared_ptr<void> WatchDeviceChanges(std::function<void()> changed) {
+    static_cast<void>(changed);
+    return nullptr;
+  }
 };
 
 /// The system in use, chosen at the first call: a studio file named by the environment variable
