@@ -4,6 +4,7 @@
 #include <condition_variable>
 #include <deque>
 #include <mutex>
+#include <optional>
 #include <thread>
 
 #include "PollSchedule.h"
@@ -18,11 +19,10 @@
 namespace Ostinet {
 
 struct PollLoop::State {
-  State(Options someOptions, Calls someCalls)
-      : options(std::move(someOptions)), calls(std::move(someCalls)) {}
+  explicit State(Options someOptions) : options(std::move(someOptions)) {}
 
   Options options;
-  Calls calls;
+  std::optional<Calls> calls;  // Unset: those of the setup, which is not made before the loop runs.
 
   std::mutex mutex;
   std::condition_variable changed;
@@ -74,19 +74,23 @@ struct PollLoop::State {
 
   void RunDue(PollSchedule::Due const& due) {
     if (due.poll) {
-      Guarded(calls.poll);
+      Guarded(calls->poll);
     }
     if (due.setupChanges && !IsStopped()) {
-      Guarded(calls.pollSetupChanges);
+      Guarded(calls->pollSetupChanges);
     }
     if (due.input && !IsStopped()) {
-      Guarded(calls.processInput);
+      Guarded(calls->processInput);
     }
   }
 
   void Loop(std::function<bool()> const& goOn) {
-    PollSchedule schedule({options.inputPeriod, calls.pollInterval, calls.pollSetupChangesInterval,
-                           options.hurriedInterval, options.hurryLasts},
+    if (!calls) {
+      calls = SetupCalls();
+    }
+    PollSchedule schedule({options.inputPeriod, calls->pollInterval,
+                           calls->pollSetupChangesInterval, options.hurriedInterval,
+                           options.hurryLasts},
                           Clock::now());
     while (!goOn || goOn()) {
       Requests requests = WaitUntil(schedule.NextDue());
@@ -123,10 +127,11 @@ PollLoop::Calls PollLoop::SetupCalls() {
 
 PollLoop::PollLoop() : PollLoop(Options()) {}
 
-PollLoop::PollLoop(Options options) : PollLoop(std::move(options), SetupCalls()) {}
+PollLoop::PollLoop(Options options) : state_(std::make_unique<State>(std::move(options))) {}
 
-PollLoop::PollLoop(Options options, Calls calls)
-    : state_(std::make_unique<State>(std::move(options), std::move(calls))) {}
+PollLoop::PollLoop(Options options, Calls calls) : PollLoop(std::move(options)) {
+  state_->calls = std::move(calls);
+}
 
 PollLoop::~PollLoop() { Stop(); }
 

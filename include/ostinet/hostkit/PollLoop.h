@@ -49,8 +49,11 @@ class PollLoop : private Noncopyable<PollLoop> {
     std::function<void(std::exception_ptr)> onError;
   };
 
+  /// Drives Setup::Instance, which is reached for the first time when the loop begins to run: so
+  /// a loop may be there before the host's callbacks are.
   PollLoop();
   explicit PollLoop(Options options);
+  /// Drives something else in its stead.
   PollLoop(Options options, Calls calls);
   ~PollLoop();
 
