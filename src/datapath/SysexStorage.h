@@ -10,8 +10,10 @@ namespace Ostinet::Impl {
 class SysexStorage {
  public:
   virtual ~SysexStorage() = default;
-  /// The first byte of the system's buffer: 20 bytes of header, then the message.
+  /// The first byte of the system's buffer: 20 bytes of header, then the message. The same for the
+  /// storage's whole life.
   virtual unsigned char* RawBytes() const = 0;
+  /// How much of the buffer is in use, header included. Does not fail.
   virtual void SetUsedBytes(std::size_t count) = 0;
 };
 
@@ -25,5 +27,8 @@ class SysexStorageMaker {
 /// The backend installs its maker at sign-in and takes it away, with null, at sign-out. Storage
 /// made before stays valid. Threads: any.
 void SetSysexStorageMaker(std::shared_ptr<SysexStorageMaker> maker);
+
+/// Storage from the maker in use; throws a VantorError where there is none. Threads: any.
+std::unique_ptr<SysexStorage> MakeSysexStorage(std::size_t bufferBytes);
 
 }  // namespace Ostinet::Impl

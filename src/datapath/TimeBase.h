@@ -3,7 +3,7 @@
 
 #include <memory>
 
-#include "ostinet/TimeStamp.h"
+#include "ostinet/Clocks.h"
 
 namespace Ostinet::Impl {
 
@@ -13,16 +13,25 @@ namespace Ostinet::Impl {
 class MasterClock {
  public:
   virtual ~MasterClock() = default;
-  /// Throws a VantorError where the system cannot tell the time.
+  /// Throws through FailWinError where the system cannot tell the time. [realtime]
   virtual unsigned long long GetTime() const = 0;
 };
 
 /// The backend installs its clock at sign-in and takes it away, with null, at sign-out. When this
-/// returns, no thread reads the old clock any more.
+/// returns, no thread reads the old clock any more. Not to be called from within GetTime.
 void SetMasterClock(std::unique_ptr<MasterClock> clock);
 
 /// One round of calibration: `now` of the master clock, the host's counter in 100 ns, and the
 /// system's milliseconds, all read together. Moves both offsets 5 % of the way. Polling thread.
 void CalibrateTimeBase(Clocks now, unsigned long long hostClocks, unsigned int milliseconds);
+
+/// How far the host's two clocks are ahead of MIDI time.
+struct TimeBaseOffsets {
+  double eventTime = 0.0;   ///< in seconds
+  double hostClocks = 0.0;  ///< in ticks of 100 ns
+};
+TimeBaseOffsets GetTimeBaseOffsets();
+/// For tests, which want to begin at a known place. Polling thread.
+void SetTimeBaseOffsets(TimeBaseOffsets const& offsets);
 
 }  // namespace Ostinet::Impl
