@@ -33,7 +33,8 @@ constexpr Verb kVerbs[] = {
     {"clock", kPlain, 0xF8, 0, 0, false, 0, "                     clock, and reset"},
     {"reset", kPlain, 0xFF, 0, 0, false, 0, ""},
     {"ch", VerbKind::kChannel, 0, 1, 1, false, 0,
-     "ch NUMBER            the channel of what follows, 1 to 16"},
+     "ch NUMBER            the channel of what follows, 1 to 16\n"
+     "  +MS                  the time of what follows, as --at"},
 };
 
 int ParseSevenBits(Verb const& verb, std::string const& word, bool isNote) {

@@ -63,21 +63,32 @@ void SendWords::Add(std::string const& argument) {
   }
 }
 
-void SendWords::AddWord(std::string const& word) {
-  if (!verb_.empty()) {
-    Verb const& verb = *FindVerb(verb_.front());
-    size_t const have = verb_.size() - 1;
-    bool const demanded = have < verb.minNumbers;
-    if (demanded || (have < verb.maxNumbers && LooksLikeNumber(word))) {
-      verb_.push_back(word);
-      if (have + 1 == verb.maxNumbers) {
-        FinishVerb();
-      }
-      return;
-    }
-    if (verb.kind != VerbKind::kSysex || FindVerb(word) != nullptr) {
+// True if the word is a number of the verb that was begun. The bytes behind "syx" are gathered as
+// any others; its end comes with the next word that is none.
+bool SendWords::TakeForVerb(std::string const& word) {
+  Verb const& verb = *FindVerb(verb_.front());
+  size_t const have = verb_.size() - 1;
+  bool const demanded = have < verb.minNumbers;
+  if (demanded || (have < verb.maxNumbers && LooksLikeNumber(word))) {
+    verb_.push_back(word);
+    if (have + 1 == verb.maxNumbers) {
       FinishVerb();
     }
+    return true;
+  }
+  if (verb.kind != VerbKind::kSysex || FindVerb(word) != nullptr) {
+    FinishVerb();
+  }
+  return false;
+}
+
+void SendWords::AddWord(std::string const& word) {
+  if (!verb_.empty() && TakeForVerb(word)) {
+    return;
+  }
+  if (word.front() == '+') {
+    SetTime(word);
+    return;
   }
   Verb const* const verb = FindVerb(word);
   if (verb == nullptr) {
@@ -157,7 +168,8 @@ void SendWords::SetTime(std::string_view text) {
   double const milliseconds = std::strtod(number.c_str(), &end);
   constexpr double kWeek = 7 * 24 * 3600e3;
   if (number.empty() || *end != '\0' || !(milliseconds >= 0) || milliseconds > kWeek) {
-    throw UsageError("\"--at\" takes milliseconds from now, like +500, not \"" + number + "\"");
+    throw UsageError("a time is given in milliseconds from the start, like +500, not \"" + number +
+                     "\"");
   }
   afterMs_ = milliseconds;
 }

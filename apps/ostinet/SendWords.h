@@ -16,7 +16,7 @@ struct ScheduledMessage {
 };
 
 /// Reads the words that `send` takes: hexadecimal bytes, names of .syx files, and verbs with their
-/// numbers. Words are read in order; a channel or a time holds for what follows it.
+/// numbers. Words are read in order; a channel or a time ("+500") holds for what follows it.
 ///
 /// Errors       UsageError for words that make no message, Failure for files that cannot be read.
 class SendWords {
@@ -35,6 +35,7 @@ class SendWords {
 
  private:
   void AddWord(std::string const& word);
+  bool TakeForVerb(std::string const& word);
   void FinishVerb();
   void FinishHex();
   void AddFile(std::string const& path);
