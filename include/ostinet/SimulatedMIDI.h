@@ -9,11 +9,12 @@
 #include <string>
 #include <vector>
 
+#include "ostinet/DeviceChanges.h"
 #include "ostinet/Export.h"
 
 namespace Ostinet {
 
-namespace Impl {
+namespace Impl::Simulated {
 class SimulatedSystem;
 }
 
@@ -122,7 +123,7 @@ class OSTINET_EXPORT SimulatedMIDI {
   /// Returns the library to its automatic choice, if this one is in use. While signed out.
   void Remove() const;
 
-  // Ports. Each change tells the listeners, unless SetNotifying(false) was called.
+  // Ports. Each change tells those who watch, unless SetNotifying(false) was called.
 
   void AddPort(SimulatedPort const& port) const;
   /// Takes away every port of that name, and of that kind if one is given. False if there was none.
@@ -144,10 +145,9 @@ class OSTINET_EXPORT SimulatedMIDI {
   /// `channel` 0 to 15.
   SimulatedChannel WhatPlays(int instrument, int channel) const;
 
-  /// `listener` is called on the thread that changes a port. Returns a token.
-  int AddDeviceListener(std::function<void()> listener) const;
-  /// When this returns, the listener is not running on another thread and will not be called.
-  void RemoveDeviceListener(int token) const;
+  /// Calls `changed` on the thread that changes a port, as long as the subscription lives. While
+  /// this studio is installed, WatchDeviceChanges leads here too.
+  DeviceChangeSubscription WatchDevices(std::function<void()> changed) const;
   void NotifyDevicesChanged() const;
   void SetNotifying(bool automatically) const;
 
@@ -210,7 +210,8 @@ class OSTINET_EXPORT SimulatedMIDI {
   void HoldLongMessages(int tries) const;
   /// "EnumPort", "EnumInstrument" or "Read" never comes to an end.
   void SetEndless(std::string const& operation, bool on) const;
-  /// The instruments of the default collection, by patch number. At first the 128 General MIDI ones.
+  /// The instruments of the default collection, by patch number. At first the 128 General MIDI
+  /// ones.
   void SetCollection(std::vector<std::uint32_t> const& patches) const;
   /// Downloaded instruments that were not unloaded.
   int CountDownloaded(std::string const& port) const;
@@ -223,13 +224,13 @@ class OSTINET_EXPORT SimulatedMIDI {
   void SetAudioSessions(std::vector<std::string> const& identifiers) const;
 
   /// The system behind, for the library.
-  std::shared_ptr<Impl::SimulatedSystem> const& GetSystem() const { return system_; }
+  std::shared_ptr<Impl::Simulated::SimulatedSystem> const& GetSystem() const { return system_; }
 
  private:
-  explicit SimulatedMIDI(std::shared_ptr<Impl::SimulatedSystem> system);
-  Impl::SimulatedSystem& Get() const;
+  explicit SimulatedMIDI(std::shared_ptr<Impl::Simulated::SimulatedSystem> system);
+  Impl::Simulated::SimulatedSystem& Get() const;
 
-  std::shared_ptr<Impl::SimulatedSystem> system_;
+  std::shared_ptr<Impl::Simulated::SimulatedSystem> system_;
 };
 
 }  // namespace Ostinet

@@ -8,7 +8,7 @@
 #include "platform/system/WindowsTypes.h"
 #include "platform/system/simulated/Studio.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// A COM object of the simulated system: counted, ends with its last reference, keeps the studio
 /// alive, and counts among the studio's objects.
@@ -102,4 +102,4 @@ class StudioClock final : public ComObject<IReferenceClock> {
   std::int64_t const ahead_;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

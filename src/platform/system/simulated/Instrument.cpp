@@ -6,7 +6,7 @@
 #include <stdexcept>
 #include <utility>
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
@@ -136,12 +136,11 @@ void Instrument::SysexEnd(bool whole) {
     reply_.push_back(0xF7);
   }
   for (Answer const& answer : answers_) {
-    bool const asked = std::equal(sysex_.begin(), sysex_.end(), answer.to.begin(), answer.to.end(),
-                                  [](std::uint8_t byte, auto const& wanted) {
-                                    return !wanted || *wanted == byte;
-                                  });
+    bool const asked = std::equal(
+        sysex_.begin(), sysex_.end(), answer.to.begin(), answer.to.end(),
+        [](std::uint8_t byte, auto const& wanted) { return !wanted || *wanted == byte; });
     if (asked) reply_.insert(reply_.end(), answer.with.begin(), answer.with.end());
   }
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -11,7 +11,7 @@
 #include "ostinet/SimulatedMIDI.h"
 #include "platform/system/simulated/StreamParser.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// Hexadecimal bytes such as "F0 41 10"; "??" gives a nothing where `wildcards` allows it. Throws
 /// std::invalid_argument with a sentence that quotes what is wrong.
@@ -64,4 +64,4 @@ class Instrument : private StreamParser::Sink {
   std::vector<std::uint8_t> reply_;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

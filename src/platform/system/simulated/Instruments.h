@@ -5,7 +5,7 @@
 
 #include "platform/system/simulated/ComObject.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// One instrument of the default collection.
 class CollectionInstrument final : public ComObject<IDirectMusicInstrument> {
@@ -47,4 +47,4 @@ class DownloadedInstrument final : public ComObject<IDirectMusicDownloadedInstru
   PortPtr port_;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -9,7 +9,7 @@
 #include "platform/system/simulated/MusicPort.h"
 #include "platform/system/simulated/WideText.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
@@ -140,4 +140,4 @@ HRESULT Collection::EnumInstrument(DWORD index, DWORD* patch, LPWSTR name, DWORD
   return Log(Op::kEnumInstrument, result, {index});
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -3,7 +3,7 @@
 
 #include "platform/system/simulated/ComObject.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// The DirectMusic session of a simulated studio.
 class Music final : public ComObject<IDirectMusic> {
@@ -57,4 +57,4 @@ class Collection final : public ComObject<IDirectMusicCollection> {
                                            DWORD nameLength) override;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -4,7 +4,7 @@
 #include <algorithm>
 #include <cstring>
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
@@ -22,8 +22,8 @@ MusicBuffer::MusicBuffer(std::shared_ptr<Studio> studio, DWORD size)
     : ComObject(std::move(studio), ObjectCounts::kBuffer, IID_IDirectMusicBuffer),
       bytes_((size + 3) & ~DWORD{3}) {}
 
-HRESULT MusicBuffer::Append(REFERENCE_TIME time, DWORD group, DWORD flags,
-                            std::uint8_t const* data, DWORD size) {
+HRESULT MusicBuffer::Append(REFERENCE_TIME time, DWORD group, DWORD flags, std::uint8_t const* data,
+                            DWORD size) {
   // Compared so that no size, however large, wraps around.
   if (size > bytes_.size() || Footprint(size) > Room()) return DMUS_E_BUFFER_FULL;
   if (used_ == 0) start_ = time;
@@ -160,4 +160,4 @@ HRESULT MusicBuffer::SetUsedBytes(DWORD bytes) {
   return Log(Op::kSetUsedBytes, S_OK, {bytes});
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -16,7 +16,7 @@
 
 #include "platform/system/simulated/ComObject.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 class MusicBuffer final : public ComObject<IDirectMusicBuffer> {
  public:
@@ -63,4 +63,4 @@ class MusicBuffer final : public ComObject<IDirectMusicBuffer> {
   REFERENCE_TIME start_ = 0;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -7,15 +7,14 @@
 #include "platform/system/simulated/Instruments.h"
 #include "platform/system/simulated/WideText.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
 constexpr std::size_t kWinMMName = 31;
 
 // Every port's GUID is this one, with the port's number in front.
-constexpr GUID kPortGUID = {
-    0, 0x5EED, 0x4A11, {0xA5, 0x1D, 0x0C, 0x71, 0x6E, 0x7B, 0x3D, 0x90}};
+constexpr GUID kPortGUID = {0, 0x5EED, 0x4A11, {0xA5, 0x1D, 0x0C, 0x71, 0x6E, 0x7B, 0x3D, 0x90}};
 
 DWORD FlagsOf(SimulatedPort const& spec) {
   switch (spec.kind) {
@@ -251,4 +250,4 @@ void MusicPort::Arrive(std::vector<std::uint8_t> bytes) {
   if (notification_ != nullptr) GetStudio().GetWaits().SignalQuietly(notification_);
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -8,7 +8,7 @@
 #include "platform/system/simulated/MusicBuffer.h"
 #include "platform/system/simulated/StreamParser.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// The capabilities that DirectMusic gives for a port: a WinMM one shows as emulated. With the
 /// studio's mutex held.
@@ -45,9 +45,7 @@ class MusicPort final : public ComObject<IDirectMusicPort>,
   HRESULT STDMETHODCALLTYPE GetNumChannelGroups(LPDWORD groups) override;
   HRESULT STDMETHODCALLTYPE Activate(BOOL active) override;
   HRESULT STDMETHODCALLTYPE SetChannelPriority(DWORD, DWORD, DWORD) override { return S_OK; }
-  HRESULT STDMETHODCALLTYPE GetChannelPriority(DWORD, DWORD, LPDWORD) override {
-    return E_NOTIMPL;
-  }
+  HRESULT STDMETHODCALLTYPE GetChannelPriority(DWORD, DWORD, LPDWORD) override { return E_NOTIMPL; }
   HRESULT STDMETHODCALLTYPE SetDirectSound(LPDIRECTSOUND, LPDIRECTSOUNDBUFFER) override {
     return S_OK;
   }
@@ -83,4 +81,4 @@ class MusicPort final : public ComObject<IDirectMusicPort>,
   std::deque<Arrival> arrivals_;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

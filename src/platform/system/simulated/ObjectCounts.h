@@ -7,7 +7,7 @@
 #include <stdexcept>
 #include <string>
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// The COM objects that are alive, by interface.
 ///
@@ -28,8 +28,9 @@ class ObjectCounts {
 
   static std::string const& NameOf(Interface which) {
     static std::array<std::string, kInterfaceCount> const names = {
-        "IDirectMusic",           "IDirectMusicPort",       "IDirectMusicBuffer",
-        "IReferenceClock",        "IDirectMusicLoader",     "IDirectMusicCollection",
+        "IDirectMusic",           "IDirectMusicPort",
+        "IDirectMusicBuffer",     "IReferenceClock",
+        "IDirectMusicLoader",     "IDirectMusicCollection",
         "IDirectMusicInstrument", "IDirectMusicDownloadedInstrument"};
     return names[static_cast<std::size_t>(which)];
   }
@@ -55,4 +56,4 @@ class ObjectCounts {
   std::array<std::atomic<int>, kInterfaceCount> counts_{};
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -4,7 +4,7 @@
 #include <algorithm>
 #include <utility>
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 OpenInput::OpenInput(Studio& studio, PortPtr port, HMIDIIN handle, Callback* callback,
                      DWORD_PTR instance)
@@ -138,4 +138,4 @@ void OpenInput::Run() {
   }
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -15,7 +15,7 @@
 #include "platform/system/simulated/StreamParser.h"
 #include "platform/system/simulated/Studio.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 class OpenInput final : public InputSink, private StreamParser::Sink {
  public:
@@ -76,4 +76,4 @@ class OpenInput final : public InputSink, private StreamParser::Sink {
   std::thread thread_;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

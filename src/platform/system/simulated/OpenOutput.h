@@ -6,7 +6,7 @@
 #include "platform/system/WindowsTypes.h"
 #include "platform/system/simulated/Studio.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// An output device that WinMM has open.
 ///
@@ -27,4 +27,4 @@ struct OpenOutput {
   }
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

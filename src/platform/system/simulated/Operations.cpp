@@ -4,7 +4,7 @@
 #include <stdexcept>
 #include <utility>
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
@@ -163,4 +163,4 @@ std::vector<SimulatedCall> CallBook::TakeLog() {
   return std::exchange(log_, {});
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

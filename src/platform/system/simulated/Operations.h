@@ -15,7 +15,7 @@
 
 #include "ostinet/SimulatedMIDI.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 enum class Op : std::uint8_t {
   kMidiInGetNumDevs,
@@ -129,4 +129,4 @@ class CallBook {
   std::vector<SimulatedCall> log_;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -3,7 +3,7 @@
 
 #include <algorithm>
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 void Recorder::Reserve(std::size_t capacity) {
   capacity_ = std::max<std::size_t>(capacity, 1);
@@ -52,4 +52,4 @@ std::vector<SimulatedMessage> Recorder::Read(std::string const* port) const {
   return result;
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -8,7 +8,7 @@
 
 #include "ostinet/SimulatedMIDI.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// What left through the outputs, the newest `capacity` messages. Once its room is made, a message
 /// of up to 24 bytes costs no allocation.
@@ -51,4 +51,4 @@ class Recorder {
   std::vector<Entry> entries_;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -3,7 +3,7 @@
 
 #include <chrono>
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 std::int64_t SimClock::Machine() {
   auto const now = std::chrono::steady_clock::now().time_since_epoch();
@@ -51,4 +51,4 @@ std::int64_t SimClock::ReadMaster() {
   return tick > 1 ? now - now % tick : now;
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

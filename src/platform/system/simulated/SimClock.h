@@ -4,7 +4,7 @@
 #include <atomic>
 #include <cstdint>
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// The time of the simulated system, in units of 100 ns: the machine's, or moved by hand.
 ///
@@ -40,4 +40,4 @@ class SimClock {
   std::atomic<std::int64_t> stillAt_{0};
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

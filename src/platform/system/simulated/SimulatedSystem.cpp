@@ -1,10 +1,11 @@
 // SPDX-License-Identifier: MIT
 #include "platform/system/simulated/SimulatedSystem.h"
 
+#include "ostinet/core/Error.h"
 #include "platform/system/simulated/Music.h"
 #include "platform/system/simulated/WideText.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 DWORD SimulatedSystem::timeGetTime() {
   long long failure = 0;
@@ -50,4 +51,4 @@ std::vector<AudioSession> SimulatedSystem::SnapshotAudioSessions() {
   return sessions;
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -1,12 +1,14 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <functional>
 #include <memory>
+#include <utility>
 
 #include "platform/system/System.h"
 #include "platform/system/simulated/Studio.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// The seam's operations over a simulated studio.
 ///
@@ -48,9 +50,12 @@ class SimulatedSystem final : public System {
   HRESULT CreateDirectMusicLoader(IDirectMusicLoader** result) override;
   std::vector<AudioSession> SnapshotAudioSessions() override;
   Waits& GetWaits() override { return studio_->GetWaits(); }
+  std::shared_ptr<void> WatchDeviceChanges(std::function<void()> changed) override {
+    return studio_->Watch(std::move(changed));
+  }
 
  private:
   std::shared_ptr<Studio> const studio_;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -6,7 +6,7 @@
 #include "platform/system/SystemWaits.h"
 #include "platform/system/simulated/ThreadRegistry.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
@@ -150,9 +150,8 @@ DWORD SimulatedWaits::Wait(Op op, DWORD count, HANDLE const* objects, DWORD mill
     }
     changed_.notify_all();
   }
-  DWORD const result = count == 1
-                           ? machine_->WaitForSingleObject(objects[0], milliseconds)
-                           : machine_->WaitForMultipleObjects(count, objects, milliseconds);
+  DWORD const result = count == 1 ? machine_->WaitForSingleObject(objects[0], milliseconds)
+                                  : machine_->WaitForMultipleObjects(count, objects, milliseconds);
   if (result == WAIT_FAILED) sLastError = machine_->GetLastError();
   {
     std::lock_guard lock(mutex_);
@@ -252,4 +251,4 @@ bool SimulatedWaits::WaitUntilIdle(std::chrono::steady_clock::time_point deadlin
   return true;
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -19,7 +19,7 @@
 #include "platform/system/simulated/Operations.h"
 #include "platform/system/simulated/SimClock.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 class SimulatedWaits final : public Waits {
  public:
@@ -61,9 +61,9 @@ class SimulatedWaits final : public Waits {
     Kind kind = Kind::kEvent;
     LONG count = 0;
     LONG maximum = 1;
-    bool fired = false;                  // a timer that is due by the hand
-    std::optional<std::int64_t> due;     // a timer that was set and has not fired
-    bool waitedFor = false;              // a thread has found its way here
+    bool fired = false;               // a timer that is due by the hand
+    std::optional<std::int64_t> due;  // a timer that was set and has not fired
+    bool waitedFor = false;           // a thread has found its way here
   };
 
   HANDLE Add(HANDLE handle, Shadow const& shadow);
@@ -83,4 +83,4 @@ class SimulatedWaits final : public Waits {
   std::shared_ptr<Registry> const threads_;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

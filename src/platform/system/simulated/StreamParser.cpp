@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "platform/system/simulated/StreamParser.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
@@ -88,4 +88,4 @@ void StreamParser::Data(std::uint8_t byte, Sink& sink) {
   message_[1] = message_[2] = 0;
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -4,7 +4,7 @@
 #include <cstddef>
 #include <cstdint>
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// Takes a stream of MIDI bytes apart, as an input driver does: running status is completed,
 /// realtime messages are taken out of the middle of others, sysex goes on byte by byte.
@@ -37,4 +37,4 @@ class StreamParser {
   bool inSysex_ = false;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -7,19 +7,23 @@
 // timeline run outside of it. While it is held the waits' own mutex may be taken, never the other
 // way round.
 
+#include <array>
+#include <atomic>
 #include <condition_variable>
 #include <cstdint>
 #include <functional>
-#include <map>
 #include <memory>
 #include <mutex>
+#include <optional>
 #include <set>
 #include <string>
 #include <thread>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "ostinet/SimulatedMIDI.h"
+#include "platform/system/common/ChangeNotifier.h"
 #include "platform/system/simulated/Instrument.h"
 #include "platform/system/simulated/ObjectCounts.h"
 #include "platform/system/simulated/Operations.h"
@@ -27,7 +31,7 @@
 #include "platform/system/simulated/SimClock.h"
 #include "platform/system/simulated/SimulatedWaits.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// Takes what arrives at an input port. Called with the studio's mutex held.
 class InputSink {
@@ -91,11 +95,13 @@ class Studio : public std::enable_shared_from_this<Studio> {
   PortPtr MusicPortWith(std::uint32_t id);
   int CountDownloaded(std::string const& port);
 
-  // Listeners (StudioPorts.cpp).
-  int AddListener(std::function<void()> listener);
-  void RemoveListener(int token);
-  void Notify();
-  void SetNotifying(bool on);
+  /// Those who are told of changed ports; the place goes with the last copy of the result.
+  std::shared_ptr<void> Watch(std::function<void()> changed) {
+    return notifier_.Add(std::move(changed));
+  }
+  void Notify() { notifier_.Notify(); }
+  /// Whether each change tells them by itself.
+  void SetNotifying(bool on) { notifying_.store(on, std::memory_order_relaxed); }
 
   // Data (StudioData.cpp). The first two with the mutex held.
   void Emit(Port& port, std::uint8_t const* bytes, std::size_t size, Recorder::Times const& times);
@@ -105,8 +111,8 @@ class Studio : public std::enable_shared_from_this<Studio> {
 
   // Time (StudioTime.cpp).
   /// Plays a message at its time, at once when that has come. With the mutex held.
-  void Schedule(PortPtr const& port, void const* owner, std::int64_t due,
-                std::uint8_t const* bytes, std::size_t size);
+  void Schedule(PortPtr const& port, void const* owner, std::int64_t due, std::uint8_t const* bytes,
+                std::size_t size);
   /// Drops what an owner has scheduled. With the mutex held.
   void Unschedule(void const* owner);
   int CountScheduled();
@@ -199,13 +205,11 @@ class Studio : public std::enable_shared_from_this<Studio> {
   bool timelineStarted_ = false;
   std::condition_variable dueChanged_;
   bool quit_ = false;
-  std::thread clockThread_;  // started with the first thing that is due later
+  std::thread clockThread_;        // started with the first thing that is due later
   std::recursive_mutex runMutex_;  // one thread at a time lets things happen
 
-  std::recursive_mutex listenersMutex_;  // held while listeners run
-  std::map<int, std::function<void()>> listeners_;
-  int lastToken_ = 0;
-  bool notifying_ = true;
+  ChangeNotifier notifier_;
+  std::atomic<bool> notifying_{true};
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -3,7 +3,7 @@
 
 #include "platform/system/simulated/Studio.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
@@ -27,9 +27,8 @@ void Studio::Emit(Port& port, std::uint8_t const* bytes, std::size_t size,
 }
 
 bool Studio::HasOutput(std::string const& name) const {
-  return std::any_of(ports_.begin(), ports_.end(), [&](PortPtr const& port) {
-    return port->IsOutput() && *port->name == name;
-  });
+  return std::any_of(ports_.begin(), ports_.end(),
+                     [&](PortPtr const& port) { return port->IsOutput() && *port->name == name; });
 }
 
 bool Studio::Deliver(std::string const& input, std::uint8_t const* bytes, std::size_t size,
@@ -53,4 +52,4 @@ bool Studio::Inject(std::string const& input, std::vector<unsigned char> const& 
   return Deliver(input, bytes.data(), bytes.size(), 0);
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

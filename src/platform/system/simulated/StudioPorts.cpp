@@ -5,7 +5,7 @@
 #include "platform/system/simulated/Studio.h"
 #include "platform/system/simulated/WideText.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 Studio::Studio() : waits_(book_, clock_) {
   for (std::uint32_t patch = 0; patch < 128; ++patch) collection.push_back(patch);
@@ -176,34 +176,8 @@ int Studio::CountDownloaded(std::string const& port) {
   return sum;
 }
 
-int Studio::AddListener(std::function<void()> listener) {
-  std::lock_guard lock(listenersMutex_);
-  listeners_[++lastToken_] = std::move(listener);
-  return lastToken_;
-}
-
-void Studio::RemoveListener(int token) {
-  std::lock_guard lock(listenersMutex_);
-  listeners_.erase(token);
-}
-
-void Studio::SetNotifying(bool on) {
-  std::lock_guard lock(listenersMutex_);
-  notifying_ = on;
-}
-
 void Studio::NotifyIfWanted() {
-  std::lock_guard lock(listenersMutex_);
-  if (notifying_) Notify();
+  if (notifying_.load(std::memory_order_relaxed)) Notify();
 }
 
-void Studio::Notify() {
-  std::lock_guard lock(listenersMutex_);
-  // A listener may add or remove listeners, itself too.
-  auto const copy = listeners_;
-  for (auto const& [token, listener] : copy) {
-    if (listeners_.count(token) != 0) listener();
-  }
-}
-
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

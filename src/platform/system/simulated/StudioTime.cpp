@@ -10,7 +10,7 @@
 #include "platform/system/simulated/OpenInput.h"
 #include "platform/system/simulated/Studio.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
@@ -69,8 +69,8 @@ void Studio::Unschedule(void const* owner) {
 
 int Studio::CountScheduled() {
   std::lock_guard lock(mutex_);
-  return static_cast<int>(std::count_if(due_.begin(), due_.end(),
-                                        [](Due const& due) { return due.timeline < 0; }));
+  return static_cast<int>(
+      std::count_if(due_.begin(), due_.end(), [](Due const& due) { return due.timeline < 0; }));
 }
 
 void Studio::AddTimelineEvent(std::int64_t at, std::int64_t every, int times,
@@ -208,4 +208,4 @@ bool Studio::Settle(int milliseconds) {
   }
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -4,7 +4,7 @@
 #include <algorithm>
 #include <vector>
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
@@ -54,4 +54,4 @@ void SimulatedWaits::Registry::Leave(std::thread::id thread) {
   entries_.erase(thread);
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -11,7 +11,7 @@
 #include "platform/system/WindowsTypes.h"
 #include "platform/system/simulated/SimulatedWaits.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 /// The threads that have ever waited through a SimulatedWaits, or made a timer there. A thread
 /// leaves by itself when it ends.
@@ -46,4 +46,4 @@ class SimulatedWaits::Registry : public std::enable_shared_from_this<Registry> {
   std::unordered_map<std::thread::id, Entry> entries_;
 };
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

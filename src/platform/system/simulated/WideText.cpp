@@ -4,7 +4,7 @@
 #include <algorithm>
 #include <cstdint>
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
@@ -63,4 +63,4 @@ void CopyWide(std::u16string const& text, WCHAR* to, std::size_t room) {
   std::fill(to + count, to + room, WCHAR());
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -3,7 +3,7 @@
 #include "platform/system/simulated/SimulatedSystem.h"
 #include "platform/system/simulated/WideText.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
@@ -84,11 +84,9 @@ MMRESULT SimulatedSystem::midiInOpen(HMIDIIN* handle, UINT device, DWORD_PTR cal
       port->opened = true;
       auto const number = studio_->NextHandle();
       *handle = reinterpret_cast<HMIDIIN>(number);
-      auto* const function = kind == CALLBACK_FUNCTION
-                                 ? reinterpret_cast<OpenInput::Callback*>(callback)
-                                 : nullptr;
-      auto const input =
-          std::make_shared<OpenInput>(*studio_, port, *handle, function, instance);
+      auto* const function =
+          kind == CALLBACK_FUNCTION ? reinterpret_cast<OpenInput::Callback*>(callback) : nullptr;
+      auto const input = std::make_shared<OpenInput>(*studio_, port, *handle, function, instance);
       studio_->openInputs[number] = input;
       input->Open(lock);
     }
@@ -159,14 +157,13 @@ MMRESULT SimulatedSystem::midiInUnprepareHeader(HMIDIIN handle, MIDIHDR* header,
 }
 
 MMRESULT SimulatedSystem::midiInAddBuffer(HMIDIIN handle, MIDIHDR* header, UINT size) {
-  return OnOpenInput(
-      *studio_, Op::kMidiInAddBuffer, handle, {size}, [&](OpenInput& input, auto&) {
-        if (!IsHeader(header, size)) return MMRESULT{MMSYSERR_INVALPARAM};
-        if ((header->dwFlags & MHDR_PREPARED) == 0) return MMRESULT{MIDIERR_UNPREPARED};
-        if ((header->dwFlags & MHDR_INQUEUE) != 0) return MMRESULT{MIDIERR_STILLPLAYING};
-        input.AddBuffer(header);
-        return MMRESULT{MMSYSERR_NOERROR};
-      });
+  return OnOpenInput(*studio_, Op::kMidiInAddBuffer, handle, {size}, [&](OpenInput& input, auto&) {
+    if (!IsHeader(header, size)) return MMRESULT{MMSYSERR_INVALPARAM};
+    if ((header->dwFlags & MHDR_PREPARED) == 0) return MMRESULT{MIDIERR_UNPREPARED};
+    if ((header->dwFlags & MHDR_INQUEUE) != 0) return MMRESULT{MIDIERR_STILLPLAYING};
+    input.AddBuffer(header);
+    return MMRESULT{MMSYSERR_NOERROR};
+  });
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated

@@ -3,7 +3,7 @@
 #include "platform/system/simulated/SimulatedSystem.h"
 #include "platform/system/simulated/WideText.h"
 
-namespace Ostinet::Impl {
+namespace Ostinet::Impl::Simulated {
 
 namespace {
 
@@ -38,9 +38,7 @@ bool IsHeader(MIDIHDR const* header, UINT size) {
   return header != nullptr && header->lpData != nullptr && size >= sizeof(MIDIHDR);
 }
 
-void Finish(MIDIHDR& header) {
-  header.dwFlags = (header.dwFlags & ~MHDR_INQUEUE) | MHDR_DONE;
-}
+void Finish(MIDIHDR& header) { header.dwFlags = (header.dwFlags & ~MHDR_INQUEUE) | MHDR_DONE; }
 
 // The bytes of a packed message: as many as its status asks for, the running status filled in.
 // A sysex that is short enough to be packed ends with its F7.
@@ -146,28 +144,26 @@ MMRESULT SimulatedSystem::midiOutOpen(HMIDIOUT* handle, UINT device, DWORD_PTR c
 }
 
 MMRESULT SimulatedSystem::midiOutClose(HMIDIOUT handle) {
-  return OnOpenOutput(
-      *studio_, Op::kMidiOutClose, handle, {}, [&](OpenOutput& output, Lock& lock) {
-        if (!output.playing.empty()) return MMRESULT{MIDIERR_STILLPLAYING};
-        studio_->openOutputs.erase(reinterpret_cast<std::uintptr_t>(handle));
-        output.port->opened = false;
-        lock.unlock();
-        output.Tell(MOM_CLOSE, 0);
-        return kNoError;
-      });
+  return OnOpenOutput(*studio_, Op::kMidiOutClose, handle, {}, [&](OpenOutput& output, Lock& lock) {
+    if (!output.playing.empty()) return MMRESULT{MIDIERR_STILLPLAYING};
+    studio_->openOutputs.erase(reinterpret_cast<std::uintptr_t>(handle));
+    output.port->opened = false;
+    lock.unlock();
+    output.Tell(MOM_CLOSE, 0);
+    return kNoError;
+  });
 }
 
 MMRESULT SimulatedSystem::midiOutReset(HMIDIOUT handle) {
-  return OnOpenOutput(
-      *studio_, Op::kMidiOutReset, handle, {}, [](OpenOutput& output, Lock& lock) {
-        auto const playing = std::exchange(output.playing, {});
-        for (auto const& [header, tries] : playing) Finish(*header);
-        lock.unlock();
-        for (auto const& [header, tries] : playing) {
-          output.Tell(MOM_DONE, reinterpret_cast<DWORD_PTR>(header));
-        }
-        return kNoError;
-      });
+  return OnOpenOutput(*studio_, Op::kMidiOutReset, handle, {}, [](OpenOutput& output, Lock& lock) {
+    auto const playing = std::exchange(output.playing, {});
+    for (auto const& [header, tries] : playing) Finish(*header);
+    lock.unlock();
+    for (auto const& [header, tries] : playing) {
+      output.Tell(MOM_DONE, reinterpret_cast<DWORD_PTR>(header));
+    }
+    return kNoError;
+  });
 }
 
 MMRESULT SimulatedSystem::midiOutShortMsg(HMIDIOUT handle, DWORD message) {
@@ -184,38 +180,37 @@ MMRESULT SimulatedSystem::midiOutShortMsg(HMIDIOUT handle, DWORD message) {
 }
 
 MMRESULT SimulatedSystem::midiOutPrepareHeader(HMIDIOUT handle, MIDIHDR* header, UINT size) {
-  return OnOpenOutput(*studio_, Op::kMidiOutPrepareHeader, handle, {size},
-                      [&](OpenOutput&, Lock&) {
+  return OnOpenOutput(*studio_, Op::kMidiOutPrepareHeader, handle, {size}, [&](OpenOutput&, Lock&) {
+    if (!IsHeader(header, size)) return MMRESULT{MMSYSERR_INVALPARAM};
+    header->dwFlags |= MHDR_PREPARED;
+    return kNoError;
+  });
+}
+
+MMRESULT SimulatedSystem::midiOutUnprepareHeader(HMIDIOUT handle, MIDIHDR* header, UINT size) {
+  return OnOpenOutput(*studio_, Op::kMidiOutUnprepareHeader, handle, {size},
+                      [&](OpenOutput& output, Lock& lock) {
                         if (!IsHeader(header, size)) return MMRESULT{MMSYSERR_INVALPARAM};
-                        header->dwFlags |= MHDR_PREPARED;
+                        auto const found = output.playing.find(header);
+                        if (found != output.playing.end() && found->second-- > 0) {
+                          return MMRESULT{MIDIERR_STILLPLAYING};
+                        }
+                        bool const finishes = found != output.playing.end();
+                        if (finishes) {
+                          output.playing.erase(found);
+                          Finish(*header);
+                        }
+                        header->dwFlags &= ~MHDR_PREPARED;
+                        lock.unlock();
+                        if (finishes) output.Tell(MOM_DONE, reinterpret_cast<DWORD_PTR>(header));
                         return kNoError;
                       });
 }
 
-MMRESULT SimulatedSystem::midiOutUnprepareHeader(HMIDIOUT handle, MIDIHDR* header, UINT size) {
-  return OnOpenOutput(
-      *studio_, Op::kMidiOutUnprepareHeader, handle, {size}, [&](OpenOutput& output, Lock& lock) {
-        if (!IsHeader(header, size)) return MMRESULT{MMSYSERR_INVALPARAM};
-        auto const found = output.playing.find(header);
-        if (found != output.playing.end() && found->second-- > 0) {
-          return MMRESULT{MIDIERR_STILLPLAYING};
-        }
-        bool const finishes = found != output.playing.end();
-        if (finishes) {
-          output.playing.erase(found);
-          Finish(*header);
-        }
-        header->dwFlags &= ~MHDR_PREPARED;
-        lock.unlock();
-        if (finishes) output.Tell(MOM_DONE, reinterpret_cast<DWORD_PTR>(header));
-        return kNoError;
-      });
-}
-
 MMRESULT SimulatedSystem::midiOutLongMsg(HMIDIOUT handle, MIDIHDR* header, UINT size) {
   return OnOpenOutput(
-      *studio_, Op::kMidiOutLongMsg, handle,
-      {size, header != nullptr ? header->dwBufferLength : 0}, [&](OpenOutput& output, Lock& lock) {
+      *studio_, Op::kMidiOutLongMsg, handle, {size, header != nullptr ? header->dwBufferLength : 0},
+      [&](OpenOutput& output, Lock& lock) {
         if (!IsHeader(header, size)) return MMRESULT{MMSYSERR_INVALPARAM};
         if ((header->dwFlags & MHDR_PREPARED) == 0) return MMRESULT{MIDIERR_UNPREPARED};
         if (output.playing.count(header) != 0) return MMRESULT{MIDIERR_STILLPLAYING};
@@ -236,4 +231,4 @@ MMRESULT SimulatedSystem::midiOutLongMsg(HMIDIOUT handle, MIDIHDR* header, UINT 
       });
 }
 
-}  // namespace Ostinet::Impl
+}  // namespace Ostinet::Impl::Simulated
