@@ -4,7 +4,7 @@
 #include <cstring>
 #include <new>
 
-#include "core/FixedBlockAllocMT.h"
+#include "core/FixedBlockAlloc.h"
 
 namespace Ostinet::Impl {
 namespace {

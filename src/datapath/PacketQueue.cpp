@@ -10,7 +10,7 @@
 
 #include "datapath/PacketQueue.h"
 
-#include "core/Atomic.h"
+#include "core/Atomics.h"
 #include "datapath/PacketNode.h"
 
 namespace Ostinet::Impl {

@@ -65,9 +65,9 @@ TEST(PacketQueueThreads, LoseNothingAndKeepEachProducersOrder) {
 
 // The pool of nodes is one for all queues, whichever thread takes and gives back.
 TEST(PacketQueueThreads, ShareThePoolBetweenQueues) {
-  constexpr unsigned kPackets = 5000;
   std::latch start(2);
   auto const run = [&start] {
+    constexpr unsigned kPackets = 5000;
     PacketQueue queue;
     OrderReceiver receiver;
     Source const source;

@@ -175,7 +175,7 @@ TEST_F(SysexRefTest, FailsWhereTheSessionHasNoRoom) {
 
 TEST_F(SysexRefTest, FailsForMoreThanTheHeaderCounts) {
   EXPECT_THROW(SysexRef(Impl::SysexImpl::kMaxBytes + 1), VantorError);
-  EXPECT_THROW(SysexRef(std::numeric_limits<size_t>::max()), VantorError);
+  EXPECT_THROW(SysexRef{std::numeric_limits<size_t>::max()}, VantorError);
   EXPECT_TRUE(session_.Record().made.empty());
 }
 
