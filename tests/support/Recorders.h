@@ -12,13 +12,7 @@
 #include <vector>
 
 #include "ostinet/Setup.h"
-
-namespace Ostinet {
-
-// For messages of failed checks.
-inline void PrintTo(UString const& text, std::ostream* out) { *out << '"' << text.string() << '"'; }
-
-}  // namespace Ostinet
+#include "support/Printers.h"
 
 namespace Ostinet::Testing {
 
