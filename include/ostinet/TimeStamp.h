@@ -40,14 +40,12 @@ class OSTINET_EXPORT TimeStamp {
   /// The sample count; asks the host for it the first time.
   double AsSampleCount() const;
   /// Asks the host, through OstinetCallbackAPI::gInstance, which sample sounds at this moment, also
-  /// where a count is here already. A stamp without a time, clock 0 or all ones, gets -100000.0, and
-  /// so does every stamp while there is no OstinetCallbackAPI.
+  /// where a count is here already. A stamp without a time, clock 0 or all ones, gets -100000.0,
+  /// and so does every stamp while there is no OstinetCallbackAPI.
   void DemandSampleTime() const;
 
   /// Stamps compare by their clocks, unsigned; the samples take no part.
-  bool operator==(TimeStamp const& other) const {
-    return clocks_.Value() == other.clocks_.Value();
-  }
+  bool operator==(TimeStamp const& other) const { return clocks_.Value() == other.clocks_.Value(); }
   bool operator!=(TimeStamp const& other) const { return !(*this == other); }
   bool operator<(TimeStamp const& other) const { return clocks_.Value() < other.clocks_.Value(); }
 

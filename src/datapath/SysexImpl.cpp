@@ -10,7 +10,7 @@
 
 namespace Ostinet {
 
-template class OSTINET_EXPORT RCPtrMT<Impl::SysexImpl>;
+template class RCPtrMT<Impl::SysexImpl>;
 
 namespace Impl {
 namespace {

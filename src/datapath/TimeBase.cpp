@@ -5,7 +5,7 @@
 #include <cmath>
 
 #include "core/Conversions.h"
-#include "core/TimerCalibrator.h"
+#include "core/Time.h"
 #include "ostinet/Clocks.h"
 
 namespace Ostinet {

@@ -32,9 +32,7 @@ TimeStamp TimeStamp::TimeStampWithSecondsAndSamples(Seconds seconds, double samp
 
 TimeStamp TimeStampWithMIDITime(Clocks clocks) { return TimeStamp::TimeStampWithMIDITime(clocks); }
 
-TimeStamp TimeStampWithSeconds(Seconds seconds) {
-  return TimeStamp::TimeStampWithSeconds(seconds);
-}
+TimeStamp TimeStampWithSeconds(Seconds seconds) { return TimeStamp::TimeStampWithSeconds(seconds); }
 
 TimeStamp TimeStampWithSecondsAndSamples(Seconds seconds, double samples) {
   return TimeStamp::TimeStampWithSecondsAndSamples(seconds, samples);

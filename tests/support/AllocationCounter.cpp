@@ -1,0 +1,38 @@
+// SPDX-License-Identifier: MIT
+#include "support/AllocationCounter.h"
+
+#include <atomic>
+#include <cstdlib>
+#include <new>
+
+namespace {
+
+std::atomic<std::size_t> gAllocations{0};
+
+void* Allocate(std::size_t size) {
+  gAllocations.fetch_add(1, std::memory_order_relaxed);
+  void* const memory = std::malloc(size > 0 ? size : 1);
+  if (memory == nullptr) {
+    throw std::bad_alloc();
+  }
+  return memory;
+}
+
+}  // namespace
+
+void* operator new(std::size_t size) { return Allocate(size); }
+void* operator new[](std::size_t size) { return Allocate(size); }
+void operator delete(void* memory) noexcept { std::free(memory); }
+void operator delete[](void* memory) noexcept { std::free(memory); }
+void operator delete(void* memory, std::size_t) noexcept { std::free(memory); }
+void operator delete[](void* memory, std::size_t) noexcept { std::free(memory); }
+
+namespace Ostinet::Testing {
+
+AllocationCounter::AllocationCounter() : start_(gAllocations.load(std::memory_order_relaxed)) {}
+
+std::size_t AllocationCounter::Count() const {
+  return gAllocations.load(std::memory_order_relaxed) - start_;
+}
+
+}  // namespace Ostinet::Testing
