@@ -13,6 +13,7 @@
 #include <thread>
 
 #include "datapath/PacketQueue.h"
+#include "datapath/SysexImpl.h"
 
 namespace Ostinet::Impl {
 namespace {
@@ -68,6 +69,48 @@ class BoostQueue {
 
  private:
   boost::lockfree::queue<PlainPacket> queue_{1024};
+  Source const source_;
+};
+
+// The same packet with what the library's queue carries, too: a reference on a sysex message, or
+// bytes on the heap.
+struct OwningPacket {
+  OwningPacket() = default;
+  explicit OwningPacket(DataPacket const& packet) : stamp(packet.stamp), length(packet.length) {
+    auto const count = static_cast<std::size_t>(length);
+    if (count > sizeof inlineBytes) {
+      heapBytes.reset(new unsigned char[count]);
+    }
+    std::memcpy(heapBytes ? heapBytes.get() : inlineBytes, packet.data, count);
+  }
+  DataPacket View() const {
+    if (sysex.get() != nullptr) {
+      return {sysex->begin(), sysex->Size(), stamp};
+    }
+    return {heapBytes ? heapBytes.get() : inlineBytes, length, stamp};
+  }
+
+  TimeStamp stamp;
+  unsigned long long length = 0;
+  RCPtrMT<SysexImpl> sysex;
+  std::unique_ptr<unsigned char[]> heapBytes;
+  unsigned char inlineBytes[16];
+};
+
+class MoodycamelOwningQueue {
+ public:
+  void Put(DataPacket const& packet) { queue_.enqueue(OwningPacket(packet)); }
+  void TakeAll(Receiver& receiver) {
+    OwningPacket taken[64];
+    while (std::size_t const count = queue_.try_dequeue_bulk(taken, std::size(taken))) {
+      for (std::size_t i = 0; i < count; ++i) {
+        receiver.HandlePacket(taken[i].View(), source_);
+      }
+    }
+  }
+
+ private:
+  moodycamel::ConcurrentQueue<OwningPacket> queue_{1024};
   Source const source_;
 };
 
@@ -136,6 +179,7 @@ void TwoThreads(benchmark::State& state) {
 BENCHMARK(Burst<OurQueue>)->Name("Queue/burst/subject")->Arg(64);
 BENCHMARK(Burst<BoostQueue>)->Name("Queue/burst/baseline:boost-lockfree")->Arg(64);
 BENCHMARK(Burst<MoodycamelQueue>)->Name("Queue/burst/baseline:moodycamel")->Arg(64);
+BENCHMARK(Burst<MoodycamelOwningQueue>)->Name("Queue/burst/baseline:moodycamel-owning")->Arg(64);
 BENCHMARK(TwoThreads<OurQueue>)->Name("Queue/threads/subject")->Arg(1000)->UseRealTime();
 BENCHMARK(TwoThreads<BoostQueue>)
     ->Name("Queue/threads/baseline:boost-lockfree")
