@@ -19,8 +19,10 @@ class PacketNode {
  public:
   static constexpr std::size_t kInlineBytes = 16;
 
-  /// With `heapBytes`, which hold a copy of the packet's bytes, or else a copy within the node.
-  PacketNode(DataPacket const& packet, std::unique_ptr<unsigned char[]> heapBytes);
+  /// A copy of up to kInlineBytes.
+  PacketNode(TimeStamp const& stamp, unsigned char const* bytes, std::size_t length);
+  /// Takes the copy of more bytes over.
+  PacketNode(TimeStamp const& stamp, std::unique_ptr<unsigned char[]> bytes, std::size_t length);
   PacketNode(TimeStamp const& stamp, SysexImpl* sysex);
   ~PacketNode();
   PacketNode(PacketNode const&) = delete;
@@ -64,21 +66,20 @@ struct alignas(16) PacketSegment {
   alignas(PacketNode) unsigned char places[kNodes * sizeof(PacketNode)];
 };
 
-inline PacketNode::PacketNode(DataPacket const& packet, std::unique_ptr<unsigned char[]> heapBytes)
-    : packet_(packet), sysex_(nullptr), heapBytes_(std::move(heapBytes)) {
-  if (heapBytes_ != nullptr) {
-    packet_.data = heapBytes_.get();
-    return;
-  }
+inline PacketNode::PacketNode(TimeStamp const& stamp, unsigned char const* bytes,
+                              std::size_t length)
+    : packet_{inlineBytes_, length, stamp}, sysex_(nullptr) {
   constexpr std::size_t kShortMessageBytes = 3;
-  auto const length = static_cast<std::size_t>(packet.length);
   if (length == kShortMessageBytes) {
-    std::memcpy(inlineBytes_, packet.data, kShortMessageBytes);  // most packets, without a call
+    std::memcpy(inlineBytes_, bytes, kShortMessageBytes);  // most packets, without a call
   } else if (length > 0) {
-    std::memcpy(inlineBytes_, packet.data, length);
+    std::memcpy(inlineBytes_, bytes, length);
   }
-  packet_.data = inlineBytes_;
 }
+
+inline PacketNode::PacketNode(TimeStamp const& stamp, std::unique_ptr<unsigned char[]> bytes,
+                              std::size_t length)
+    : packet_{bytes.get(), length, stamp}, sysex_(nullptr), heapBytes_(std::move(bytes)) {}
 
 inline PacketNode::PacketNode(TimeStamp const& stamp, SysexImpl* sysex) : sysex_(sysex) {
   packet_.stamp = stamp;

@@ -76,22 +76,25 @@ PacketQueue::~PacketQueue() {
 }
 
 void PacketQueue::Enqueue(DataPacket const& packet) {
-  DataPacket const whole{packet.data, packet.data != nullptr ? packet.length : 0, packet.stamp};
-  // What may throw comes first: a node that is reserved must arrive.
-  std::unique_ptr<unsigned char[]> heapBytes;
-  if (whole.length > PacketNode::kInlineBytes) {
-    auto const length = static_cast<std::size_t>(whole.length);
-    heapBytes.reset(new unsigned char[length]);
-    std::memcpy(heapBytes.get(), whole.data, length);
+  auto const length = static_cast<std::size_t>(packet.data != nullptr ? packet.length : 0);
+  if (length <= PacketNode::kInlineBytes) {
+    Put(packet.stamp, packet.data, length);
+    return;
   }
-  Reservation const place = Reserve();
-  new (place.segment->Place(place.index)) PacketNode(whole, std::move(heapBytes));
-  place.segment->arrived[place.index].store(true, std::memory_order_release);
+  std::unique_ptr<unsigned char[]> bytes(new unsigned char[length]);
+  std::memcpy(bytes.get(), packet.data, length);
+  Put(packet.stamp, std::move(bytes), length);
 }
 
 void PacketQueue::Enqueue(TimeStamp const& stamp, RCPtrMT<SysexImpl> const& sysex) {
+  Put(stamp, sysex.get());
+}
+
+// Making the node must not throw: a place that is reserved must be filled.
+template <class... Args>
+void PacketQueue::Put(Args&&... args) {
   Reservation const place = Reserve();
-  new (place.segment->Place(place.index)) PacketNode(stamp, sysex.get());
+  new (place.segment->Place(place.index)) PacketNode(std::forward<Args>(args)...);
   place.segment->arrived[place.index].store(true, std::memory_order_release);
 }
 

@@ -52,6 +52,8 @@ class PacketQueue {
     std::size_t index;
   };
 
+  template <class... Args>
+  void Put(Args&&... args);
   Reservation Reserve();
   unsigned long long CountReserved();
   bool FindArrived();
