@@ -12,12 +12,19 @@
 #include "ostinet/core/SortedVector.h"
 
 namespace Ostinet {
-struct PatchNumbers {
+
+/// What selects a patch: program, and bank by its coarse and fine half. 255 means none.
+struct OSTINET_EXPORT PatchNumbers {
   unsigned char program, msb, lsb;
   PatchNumbers();
   PatchNumbers(unsigned char, unsigned char, unsigned char);
 };
-class Names {
+
+/// Refers to one name document, or a part of one.
+///
+/// Ownership    A value.
+/// Null handle  Default-constructed: Exists is false.
+class OSTINET_EXPORT Names {
  public:
   enum Type {
     kNoNames = 0,
@@ -36,7 +43,12 @@ class Names {
   bool operator==(Names const&) const;
   bool operator!=(Names const&) const;
 };
-class NamesCatalog {
+
+/// The name documents of this machine.
+///
+/// Ownership    One object, which lives to the end of the process.
+/// Threads      Instance: [any thread]; the rest the host's polling thread.
+class OSTINET_EXPORT NamesCatalog {
  public:
   static NamesCatalog& Instance();
   Names FindMaster(UString const& manufacturer, UString const& model);
@@ -45,9 +57,16 @@ class NamesCatalog {
   Names FindStandardMode(UString const& name);
   void FindStandardModes(std::vector<Names>& out);
 };
+
 class NoteNameList;
 class ControlList;
-class DestinationMode : public Object {
+
+/// A mode that a destination can be in, with names of its own.
+///
+/// Ownership    Counted, as Object.
+/// Null handle  kNoDestinationMode.
+/// Threads      The host's polling thread.
+class OSTINET_EXPORT DestinationMode : public Object {
  public:
   static const MatchObjectID kObjectID = MatchObjectID(5);
   static DestinationMode const kNoDestinationMode;
@@ -60,7 +79,13 @@ class DestinationMode : public Object {
   void GetEnablingCommand(DataBuffer&, TimeStamp, unsigned char deviceID) const;
   void GetDisablingCommand(DataBuffer&, TimeStamp, unsigned char deviceID) const;
 };
-class DestinationNameSet : public Object {
+
+/// The banks that one or more channels offer. Channels are 0 to 15.
+///
+/// Ownership    Counted, as Object.
+/// Null handle  kNoDestinationNameSet.
+/// Threads      The host's polling thread.
+class OSTINET_EXPORT DestinationNameSet : public Object {
  public:
   static const MatchObjectID kObjectID = MatchObjectID(6);
   static DestinationNameSet const kNoDestinationNameSet;
@@ -74,7 +99,13 @@ class DestinationNameSet : public Object {
   std::pair<DestinationMode, unsigned short> GetMode(int index) const;
   unsigned short GetChannels() const;
 };
-class PatchBank : public Object {
+
+/// A bank of patches.
+///
+/// Ownership    Counted, as Object.
+/// Null handle  kNoPatchBank.
+/// Threads      The host's polling thread.
+class OSTINET_EXPORT PatchBank : public Object {
  public:
   static const MatchObjectID kObjectID = MatchObjectID(7);
   static PatchBank const kNoPatchBank;
@@ -88,7 +119,13 @@ class PatchBank : public Object {
   unsigned char GetController32Number() const;
   DataBuffer GetCommand(TimeStamp, short channel, unsigned char deviceID) const;
 };
-class Patch : public Object {
+
+/// One patch of a bank. Its object tag is the bank's: stored references rely on that.
+///
+/// Ownership    Counted, as Object.
+/// Null handle  kNoPatch.
+/// Threads      The host's polling thread.
+class OSTINET_EXPORT Patch : public Object {
  public:
   static const MatchObjectID kObjectID = MatchObjectID(7);
   static Patch const kNoPatch;
@@ -103,13 +140,21 @@ class Patch : public Object {
   NoteNameList GetNoteNames() const;
   ControlList GetControlNames() const;
 };
-struct NoteGroup {
+
+/// Notes that belong together.
+struct OSTINET_EXPORT NoteGroup {
   int id;
   UString name;
   std::vector<unsigned char> pitches;
   NoteGroup();
 };
-class NoteNameListBase : public Object {
+
+/// What the notes of a patch are called. Pitches are 0 to 127.
+///
+/// Ownership    Counted, as Object.
+/// Null handle  Has no names.
+/// Threads      The host's polling thread.
+class OSTINET_EXPORT NoteNameListBase : public Object {
  public:
   virtual UString GetName() const;
   virtual ~NoteNameListBase();
@@ -126,7 +171,9 @@ class NoteNameListBase : public Object {
   NoteNameListBase();
   explicit NoteNameListBase(RCPtrMT<Impl::ObjectImpl> const&);
 };
-class NoteNameList : public NoteNameListBase {
+
+/// The note names of one patch, which can be edited.
+class OSTINET_EXPORT NoteNameList : public NoteNameListBase {
  public:
   static const MatchObjectID kObjectID = MatchObjectID(9);
   static NoteNameList const kNoNoteNameList;
@@ -139,7 +186,9 @@ class NoteNameList : public NoteNameListBase {
   void RemoveNoteGroup(int groupID, bool removeNotes) const;
   int GetUnusedGroupID() const;
 };
-class DefaultNoteNameList : public NoteNameListBase {
+
+/// The note names of a name set, for patches without their own.
+class OSTINET_EXPORT DefaultNoteNameList : public NoteNameListBase {
  public:
   static const MatchObjectID kObjectID = MatchObjectID(10);
   static DefaultNoteNameList const kNoDefaultNoteNameList;
@@ -147,8 +196,14 @@ class DefaultNoteNameList : public NoteNameListBase {
   DefaultNoteNameList(RCPtrMT<Impl::DestNameSetImpl> const&);
   DestinationNameSet GetNameSet() const;
 };
+
+/// Which kind of message a control is.
 enum ControlType : int {};
-class Control {
+
+/// One control of a patch: its number, its name, its range.
+///
+/// Ownership    A value.
+class OSTINET_EXPORT Control {
  public:
   typedef sorted_vector_map<unsigned short, UString, std::less<unsigned short> > ValueMap;
   Control();
@@ -175,7 +230,13 @@ class Control {
   std::pair<unsigned short, UString> GetValueName(int) const;
   UString GetNameForValue(unsigned short) const;
 };
-class ControlListBase : public Object {
+
+/// What the controls of a patch are called.
+///
+/// Ownership    Counted, as Object.
+/// Null handle  Has no controls.
+/// Threads      The host's polling thread.
+class OSTINET_EXPORT ControlListBase : public Object {
  public:
   virtual UString GetName() const;
   virtual ~ControlListBase();
@@ -188,7 +249,9 @@ class ControlListBase : public Object {
   ControlListBase();
   explicit ControlListBase(RCPtrMT<Impl::ObjectImpl> const&);
 };
-class ControlList : public ControlListBase {
+
+/// The controls of one patch, which can be edited.
+class OSTINET_EXPORT ControlList : public ControlListBase {
  public:
   static const MatchObjectID kObjectID = MatchObjectID(11);
   static ControlList const kNoControlList;
@@ -198,7 +261,9 @@ class ControlList : public ControlListBase {
   void SetControl(Control const&) const;
   void ClearControl(ControlType, unsigned short) const;
 };
-class DefaultControlList : public ControlListBase {
+
+/// The controls of a name set, for patches without their own.
+class OSTINET_EXPORT DefaultControlList : public ControlListBase {
  public:
   static const MatchObjectID kObjectID = MatchObjectID(12);
   static DefaultControlList const kNoDefaultControlList;
@@ -206,4 +271,5 @@ class DefaultControlList : public ControlListBase {
   DefaultControlList(RCPtrMT<Impl::DestNameSetImpl> const&);
   DestinationNameSet GetNameSet() const;
 };
+
 }  // namespace Ostinet

@@ -6,6 +6,19 @@
 
 namespace Ostinet::Impl {
 
+/// What a destination's patches are called: the side of a destination that knows documents. The
+/// destination tells it what happens; it does the rest.
+class DestinationNames {
+ public:
+  virtual ~DestinationNames() = default;
+  /// Looks anew at what the names follow from; true if they changed.
+  virtual bool Renew() = 0;
+  /// Writes what the user edited.
+  virtual void SaveEditedBanks() = 0;
+  /// The destination is about to leave the studio.
+  virtual void WillRemove() = 0;
+};
+
 /// A destination: an endpoint that is sent to.
 class DestinationImpl : public EndpointImpl {
  public:
@@ -20,8 +33,18 @@ class DestinationImpl : public EndpointImpl {
   /// The channels on which a patch change was sent since the last call; bit n is channel n.
   unsigned short TakeChangedChannels();
 
+  /// Null for a destination without names.
+  DestinationNames* GetNames() const { return names_.get(); }
+  void SetNames(std::unique_ptr<DestinationNames> names) { names_ = std::move(names); }
+  /// Renews the names, and tells the listener if they changed.
+  void RenewNames();
+
  private:
   RCPtrMT<ChannelPatchState> channelState_;
+  std::unique_ptr<DestinationNames> names_;
 };
+
+/// The endpoint as a destination; null for a source, and for null.
+DestinationImpl* AsDestination(EndpointImpl* endpoint);
 
 }  // namespace Ostinet::Impl

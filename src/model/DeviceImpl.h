@@ -2,6 +2,7 @@
 #pragma once
 
 #include "model/DeviceObjectImpl.h"
+#include "model/EntityImpl.h"
 
 namespace Ostinet::Impl {
 

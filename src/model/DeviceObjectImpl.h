@@ -39,7 +39,10 @@ class DeviceObjectImpl : public ObjectImpl {
   SlotID GetSlotID() const;
 
  protected:
+  /// Takes the peer over; the most derived constructor activates it.
   DeviceObjectImpl(std::unique_ptr<ImplImpl> peer, bool isDirect);
+  /// The "Properties" element: what the peer itself holds.
+  void WriteProperties(XMLLib::Writer& writer) const;
 
  private:
   std::unique_ptr<ImplImpl> const peer_;

@@ -66,9 +66,13 @@ class EndpointImpl : public DeviceObjectImpl {
   bool HasConnections() const;
   boost::optional<bool> IsInterface() const;
   void ClearCachedNames();
+  /// For an entity that goes without Deactivate, at the end of the process.
+  void LeaveEntity() { kind_.entity = nullptr; }
 
-  /// On a direct endpoint: ties `endpoint` to it or unties it, and writes both properties.
+  /// On a direct endpoint: ties `endpoint` to it or unties it, and writes both properties. One
+  /// that hangs on another port leaves that one's list first; the property there stays.
   void AddConnected(EndpointImpl* endpoint);
+  /// Null, or an endpoint that hangs elsewhere, changes no link here.
   void RemoveConnected(EndpointImpl* endpoint);
   /// Replaces the connected endpoints; writes no property.
   void SetConnections(std::vector<EndpointImpl*> const& endpoints);
@@ -78,6 +82,19 @@ class EndpointImpl : public DeviceObjectImpl {
                bool isDestination);
 
  private:
+  /// Where the endpoint stands among the endpoints of its direction in its entity.
+  struct Place {
+    int index = -1;          // -1: in no entity
+    bool hasSiblings = false;
+  };
+  Place FindPlace() const;
+  UString BuildName() const;
+  UString BuildEntityAndEndpointName() const;
+  bool WorkOutStandalone() const;
+  void WriteConnections();
+  void Disconnect();
+  void Unpair();
+
   Setup& setup_;
   EndpointKind kind_;                   // links cleared by Deactivate
   Receiver* directReceiver_ = nullptr;  // the host's

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include "model/DestinationImpl.h"
 #include "model/DeviceObjectImpl.h"
 
 namespace Ostinet::Impl {
@@ -30,9 +31,12 @@ class EntityImpl : public DeviceObjectImpl {
   void AddDestination(RCPtrMT<DestinationImpl> const& destination);
   void RemoveSource(EndpointImpl* source);
   void RemoveDestination(EndpointImpl* destination);
-  /// For an endpoint that takes itself out: its siblings keep their cached names.
+  /// For an endpoint that takes itself out: its siblings keep their cached names, as hosts that
+  /// show them during the change rely on.
   void ForgetEndpoint(EndpointImpl* endpoint);
   void ClearCachedNames();
+  /// For a device that goes without Deactivate, at the end of the process.
+  void LeaveDevice() { device_ = nullptr; }
 
  private:
   DeviceImpl* device_;  // cleared by Deactivate

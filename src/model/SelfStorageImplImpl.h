@@ -8,9 +8,13 @@
 namespace Ostinet::Impl {
 
 /// A peer that keeps its properties itself. Reads climb to the parent's store; writes stay here.
+/// A key that is held with another type than asked for ends the climb without a value.
 class SelfStorageImplImpl : public ImplImpl {
  public:
   using Store = std::map<UString, PropertyValue>;
+
+  SelfStorageImplImpl() = default;
+  ~SelfStorageImplImpl() override;
 
   bool GetFile(UString const& key, UString& path) const override;
   bool GetDict(UString const& key, PropertyDict& out) const override;
@@ -45,6 +49,9 @@ class SelfStorageImplImpl : public ImplImpl {
   template <class Value, class Out>
   bool Read(UString const& key, Out& out) const;
   bool Write(UString const& key, PropertyValue value);
+  // The only two that change the store: they keep the index of unique IDs right.
+  void Put(UString const& key, PropertyValue value);
+  void Erase(UString const& key);
 
   Store store_;
 };

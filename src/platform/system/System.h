@@ -5,6 +5,7 @@
 // parameters and results that the system publishes. The backend, the port classes and the sender
 // call nothing else. Each implementation behind it (windows, simulated, native) is one folder.
 
+#include <functional>
 #include <memory>
 #include <string>
 #include <vector>

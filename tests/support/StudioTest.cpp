@@ -1,0 +1,28 @@
+// SPDX-License-Identifier: MIT
+#include "support/StudioTest.h"
+
+#include <fstream>
+#include <random>
+
+namespace Ostinet::Testing {
+
+MemoryPrefs::MemoryPrefs() {
+  std::random_device random;
+  folder = std::filesystem::temp_directory_path() /
+           ("ostinet-test-" + std::to_string(random()) + std::to_string(random()));
+  std::filesystem::create_directories(folder);
+}
+
+MemoryPrefs::~MemoryPrefs() {
+  std::error_code ignored;
+  std::filesystem::remove_all(folder, ignored);
+}
+
+UString MemoryPrefs::MakeFile(std::string const& name, std::string const& content) {
+  std::filesystem::path const path = folder / name;
+  std::filesystem::create_directories(path.parent_path());
+  std::ofstream(path, std::ios::binary) << content;
+  return UString(path.string().c_str());
+}
+
+}  // namespace Ostinet::Testing
