@@ -1,4 +1,5 @@
 // SPDX-License-Identifier: MIT
+#include <boost/optional/optional_io.hpp>
 #include <cstdlib>
 
 #include "model/PropertyKeys.h"
@@ -212,7 +213,7 @@ TEST_F(EndpointTest, ALoopIsKnownByItsDriver) {
   EXPECT_FALSE(port.IsLoop());
 }
 
-TEST_F(EndpointTest, BroadcastAndPregenComeFromTheProperyAndThePeer) {
+TEST_F(EndpointTest, BroadcastAndPregenComeFromThePropertyAndThePeer) {
   Destination const port = setup.MakePort("Port");
   EXPECT_FALSE(port.IsBroadcast());
   TestSetup::SetInt(port, "broadcast", 1);

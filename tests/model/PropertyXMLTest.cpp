@@ -21,20 +21,20 @@ class PropertyXMLTest : public StudioTest {
   PropertyXMLTest() { setup.SignIn("test", nullptr, &prefs); }
   ~PropertyXMLTest() override { setup.SignIn("test", nullptr, nullptr); }
 
-  /// What `peer` writes, under a root element.
-  std::string Write(TestPeer const& peer) {
+  /// What `store` writes, under a root element.
+  std::string Write(TestPeer const& store) {
     File const file{FileSpecification(prefs.FolderPath() + "/store.xml")};
     XMLLib::Writer writer(file);
     writer.StartElement("Properties");
-    peer.WriteProperties(writer);
+    store.WriteProperties(writer);
     writer.Close();
     std::vector<unsigned char> const bytes = file.Read();
     return std::string(bytes.begin(), bytes.end());
   }
-  static void Read(std::string const& xml, TestPeer& peer, bool skipIDs = false) {
+  static void Read(std::string const& xml, TestPeer& store, bool skipIDs = false) {
     XMLLib::Parser parser(xml.data(), xml.size());
     ASSERT_TRUE(parser.DownToChild("Properties"));
-    Impl::ReadProperties(parser, peer, skipIDs);
+    Impl::ReadProperties(parser, store, skipIDs);
   }
 
   TestPeer peer{setup};
@@ -42,7 +42,6 @@ class PropertyXMLTest : public StudioTest {
 };
 
 TEST_F(PropertyXMLTest, AnEmptyStoreWritesNothing) {
-  XMLLib::Parser parser(nullptr, 0);
   std::string const xml = Write(peer);
   XMLLib::Parser written(xml.data(), xml.size());
   ASSERT_TRUE(written.DownToChild());
