@@ -55,9 +55,7 @@ bool SelfStorageImplImpl::GetString(UString const& key, UString& out) const {
   return Read<UString>(key, out);
 }
 
-bool SelfStorageImplImpl::GetInt(UString const& key, int& out) const {
-  return Read<int>(key, out);
-}
+bool SelfStorageImplImpl::GetInt(UString const& key, int& out) const { return Read<int>(key, out); }
 
 bool SelfStorageImplImpl::SetFile(UString const& key, UString const& path) {
   return Write(key, PropertyPath{path});

@@ -1,9 +1,8 @@
 // SPDX-License-Identifier: MIT
-#include "model/PropertyXML.h"
-
 #include <random>
 
 #include "model/PropertyKeys.h"
+#include "model/PropertyXML.h"
 #include "support/StudioTest.h"
 
 namespace Ostinet::Testing {
@@ -98,9 +97,10 @@ TEST_F(PropertyXMLTest, AnElementWithoutAKeyIsSkipped) {
 }
 
 TEST_F(PropertyXMLTest, UnknownElementsAreSkippedWithWhatIsInThem) {
-  Read("<Properties><Real key='r'><Int key='x'>1</Int></Real><String key='s'>t</String>"
-       "</Properties>",
-       back);
+  Read(
+      "<Properties><Real key='r'><Int key='x'>1</Int></Real><String key='s'>t</String>"
+      "</Properties>",
+      back);
   EXPECT_EQ(back.OwnProperties().size(), 1U);
 }
 
@@ -117,9 +117,10 @@ TEST_F(PropertyXMLTest, AnImportLeavesIDsOutAndReadsTheRest) {
 
 // A Dict has no numbers.
 TEST_F(PropertyXMLTest, ANumberInADictIsLeftOut) {
-  Read("<Properties><Dict key='d'><Int key='i'>1</Int><String key='s'>t</String>"
-       "<String>no key</String></Dict></Properties>",
-       back);
+  Read(
+      "<Properties><Dict key='d'><Int key='i'>1</Int><String key='s'>t</String>"
+      "<String>no key</String></Dict></Properties>",
+      back);
   PropertyDict dict;
   ASSERT_TRUE(back.GetDict("d", dict));
   EXPECT_EQ(dict.entries.size(), 1U);
@@ -127,10 +128,11 @@ TEST_F(PropertyXMLTest, ANumberInADictIsLeftOut) {
 }
 
 TEST_F(PropertyXMLTest, NumbersThatDoNotFitReadAsZero) {
-  Read("<Properties><Int key='max'>2147483647</Int><Int key='min'>-2147483648</Int>"
-       "<Int key='more'>2147483648</Int><Int key='huge'>99999999999999999999</Int>"
-       "<Int key='text'>abc</Int><Int key='none'/></Properties>",
-       back);
+  Read(
+      "<Properties><Int key='max'>2147483647</Int><Int key='min'>-2147483648</Int>"
+      "<Int key='more'>2147483648</Int><Int key='huge'>99999999999999999999</Int>"
+      "<Int key='text'>abc</Int><Int key='none'/></Properties>",
+      back);
   auto const number = [&](char const* key) {
     int value = -1;
     EXPECT_TRUE(back.GetInt(key, value)) << key;
@@ -157,9 +159,10 @@ TEST_F(PropertyXMLTest, AFileWithoutAPathIsAnEmptyOne) {
 }
 
 TEST_F(PropertyXMLTest, APathOfAnUnknownTypeIsEmpty) {
-  Read("<Properties><File key='a'><Path type='Elsewhere'>/a</Path></File>"
-       "<File key='b'><Path>/a</Path></File></Properties>",
-       back);
+  Read(
+      "<Properties><File key='a'><Path type='Elsewhere'>/a</Path></File>"
+      "<File key='b'><Path>/a</Path></File></Properties>",
+      back);
   UString path = "x";
   EXPECT_TRUE(back.GetFile("a", path));
   EXPECT_EQ(path, UString());
@@ -188,8 +191,7 @@ TEST_F(PropertyXMLTest, AFileThatDoesNotExistIsWrittenWithItsFullPath) {
 // A search, not a test of the front: studios were saved so.
 TEST_F(PropertyXMLTest, AFolderIsCutOutWhereverItOccursInThePath) {
   MemoryPrefs other;
-  std::filesystem::path const inside =
-      other.folder / prefs.folder.relative_path() / "x.midnam";
+  std::filesystem::path const inside = other.folder / prefs.folder.relative_path() / "x.midnam";
   std::filesystem::create_directories(inside.parent_path());
   other.MakeFile((prefs.folder.relative_path() / "x.midnam").string());
   peer.SetFile("f", inside.string().c_str());
@@ -198,8 +200,9 @@ TEST_F(PropertyXMLTest, AFolderIsCutOutWhereverItOccursInThePath) {
   Read(xml, back);
   UString path;
   ASSERT_TRUE(back.GetFile("f", path));
-  EXPECT_EQ(path, prefs.FolderPath() +
-                      UString(std::filesystem::path("/x.midnam").make_preferred().string().c_str()));
+  EXPECT_EQ(path,
+            prefs.FolderPath() +
+                UString(std::filesystem::path("/x.midnam").make_preferred().string().c_str()));
 }
 
 TEST_F(PropertyXMLTest, WithoutAHostsFolderItsPathsAreLost) {
