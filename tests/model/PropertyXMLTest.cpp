@@ -190,6 +190,9 @@ TEST_F(PropertyXMLTest, AFileThatDoesNotExistIsWrittenWithItsFullPath) {
 
 // A search, not a test of the front: studios were saved so.
 TEST_F(PropertyXMLTest, AFolderIsCutOutWhereverItOccursInThePath) {
+  if (prefs.folder.has_root_name()) {
+    GTEST_SKIP() << "a folder of a drive occurs at the front of paths only";
+  }
   MemoryPrefs other;
   std::filesystem::path const inside = other.folder / prefs.folder.relative_path() / "x.midnam";
   std::filesystem::create_directories(inside.parent_path());
