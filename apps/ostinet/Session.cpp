@@ -64,6 +64,8 @@ void NotifyError(std::exception_ptr const& error) {
     std::rethrow_exception(error);
   } catch (std::exception const& exception) {
     Notify(exception.what());
+  } catch (...) {
+    Notify("an unknown error");
   }
 }
 
@@ -83,7 +85,7 @@ std::unique_ptr<FolderPrefs> Prepare(GlobalOptions const& options) {
 
 Session::Session(GlobalOptions const& options, Receiver* receiver, SetupListener* listener)
     : prefs_(Prepare(options)), loop_(LoopOptions()), callbacks_([this] { loop_.Hurry(); }) {
-  std::string const why = WhyNoMIDI();
+  std::string const why = WhyNoMIDI(options.studio);
   if (!why.empty()) {
     Notify(why);
   }

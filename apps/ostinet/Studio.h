@@ -10,8 +10,8 @@ namespace Ostinet::Tool {
 /// the machine). Throws Failure for a file that describes no studio.
 void ChooseStudio(std::string const& studioFile);
 
-/// Where the machine has no MIDI and no simulated studio is in use: why, and what to do about it;
-/// else empty.
-std::string WhyNoMIDI();
+/// Where the machine has no MIDI and nobody asked for a simulated studio, by that option or by the
+/// environment: why, and what to do about it; else empty.
+std::string WhyNoMIDI(std::string const& studioFile);
 
 }  // namespace Ostinet::Tool

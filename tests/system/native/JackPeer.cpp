@@ -4,7 +4,7 @@
 #include <jack/midiport.h>
 
 #include <chrono>
-#include <cstring>
+#include <cstdint>
 #include <thread>
 
 namespace Ostinet::Testing {
@@ -33,6 +33,7 @@ void JackPeer::Process(jack_nframes_t frames) {
   jack_midi_event_t event;
   for (std::uint32_t i = 0; jack_midi_event_get(&event, in, i) == 0; ++i) {
     heardRing_.Push(0, event.buffer, event.size);
+    ++countHeard_;
   }
   void* const out = jack_port_get_buffer(out_, frames);
   jack_midi_clear_buffer(out);

@@ -3,9 +3,8 @@
 
 #include <jack/jack.h>
 
-#include <condition_variable>
-#include <cstdint>
-#include <mutex>
+#include <atomic>
+#include <cstddef>
 #include <string>
 #include <vector>
 
@@ -30,6 +29,8 @@ class JackPeer {
   std::vector<Bytes> WaitForEvents(std::size_t count);
   /// The same by bytes, whatever the events.
   Bytes WaitForBytes(std::size_t count);
+  /// Events that reached "in", taken or not. [any thread]
+  std::size_t CountHeard() const { return countHeard_; }
   /// What "out" is called from now on.
   void RenameOut(std::string const& name);
 
@@ -45,6 +46,7 @@ class JackPeer {
   Impl::MessageRing heardRing_;
   Impl::MessageRing playRing_;
   std::vector<Bytes> heard_;
+  std::atomic<std::size_t> countHeard_{0};
   Bytes next_;  // of the process callback
 };
 

@@ -42,7 +42,7 @@ void RemoveRemains(std::string const& server) {
 }
 
 pid_t SpawnServer(std::string const& name) {
-  std::string text[] = {"jackd", "-S",    "--no-realtime", "-n", name, "-d",
+  std::string text[] = {"jackd", "-S", "--no-realtime", "-n", name, "-d",
                         "dummy", "-r", "48000",         "-p", "256"};
   std::vector<char*> arguments;
   for (std::string& argument : text) arguments.push_back(argument.data());

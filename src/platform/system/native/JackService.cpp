@@ -15,7 +15,11 @@ JackService::JackService() : hint_(std::make_shared<ChangeHint>()) {}
 std::shared_ptr<JackClient> JackService::Client() {
   std::scoped_lock lock(mutex_);
   if (client_ && client_->IsAlive()) return client_;
-  client_.reset();
+  if (client_) {
+    dead_ = client_;
+    client_.reset();
+  }
+  if (!dead_.expired()) return nullptr;
   client_ = JackClient::Connect(NextWireClientName(), [hint = hint_] {
     std::scoped_lock hintLock(hint->mutex);
     if (hint->call) hint->call();

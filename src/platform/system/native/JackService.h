@@ -12,6 +12,10 @@ namespace Ostinet::Impl {
 
 /// The ports of a JACK server. The server may come, die and come again; each wire belongs to the
 /// server that it was opened on and is of no use once that has died.
+///
+/// A new server is looked for only when every wire to the dead one has been closed: JACK's library
+/// frees whatever clients of a dead server are left when it connects to the next, and closing such
+/// a client afterwards is fatal.
 class JackService : public MidiService {
  public:
   JackService();
@@ -33,7 +37,8 @@ class JackService : public MidiService {
 
   std::shared_ptr<ChangeHint> const hint_;
   std::mutex mutex_;
-  std::shared_ptr<JackClient> client_;  // guarded by mutex_
+  std::shared_ptr<JackClient> client_;  // guarded by mutex_, as is the following
+  std::weak_ptr<JackClient> dead_;      // of the last server; wires may still hold it
 };
 
 }  // namespace Ostinet::Impl

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
-#include <rtmidi/RtMidi.h>
+#include <RtMidi.h>
 
 #include <atomic>
 #include <string>
