@@ -1,0 +1,31 @@
+// SPDX-License-Identifier: MIT
+#pragma once
+
+#include <functional>
+
+#include "Session.h"
+
+namespace CLI {
+class App;
+}
+
+namespace Ostinet::Tool {
+
+/// What reading the command line leaves behind.
+struct CommandLine {
+  GlobalOptions options;
+  std::function<void()> run;  ///< the command that was given; throws UsageError or Failure
+};
+
+// Each adds its command with its options and its help, and sets `run` where it is given. Both
+// arguments outlive the run.
+void AddListCommand(CLI::App& app, CommandLine& line);
+void AddWatchCommand(CLI::App& app, CommandLine& line);
+void AddMonitorCommand(CLI::App& app, CommandLine& line);
+void AddSendCommand(CLI::App& app, CommandLine& line);
+void AddPanicCommand(CLI::App& app, CommandLine& line);
+
+/// Adds --for and --count.
+void AddLimits(CLI::App& command, Limits& limits);
+
+}  // namespace Ostinet::Tool

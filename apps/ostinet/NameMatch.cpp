@@ -1,0 +1,103 @@
+// SPDX-License-Identifier: MIT
+#include "NameMatch.h"
+
+#include "Errors.h"
+#include "ostinet/core/UString.h"
+
+namespace Ostinet::Tool {
+namespace {
+
+using Fits = bool (*)(UString const& name, UString const& wanted);
+
+bool IsExactly(UString const& name, UString const& wanted) { return name == wanted; }
+
+bool IsButForCase(UString const& name, UString const& wanted) {
+  return name.equal(wanted, UString::kIgnoreCase);
+}
+
+bool HasAt(UString const& name, UString const& wanted, size_t position) {
+  return name.substr(position, wanted.length()).equal(wanted, UString::kIgnoreCase);
+}
+
+bool BeginsWith(UString const& name, UString const& wanted) { return HasAt(name, wanted, 0); }
+
+bool Holds(UString const& name, UString const& wanted) {
+  for (size_t at = 0; at + wanted.length() <= name.length(); ++at) {
+    if (HasAt(name, wanted, at)) {
+      return true;
+    }
+  }
+  return false;
+}
+
+// From the strictest on; the first that fits any candidate decides.
+constexpr Fits kWaysToFit[] = {IsExactly, IsButForCase, BeginsWith, Holds};
+
+std::string Listed(std::vector<Candidate> const& candidates, std::vector<size_t> const& places) {
+  std::string text;
+  for (size_t const place : places) {
+    text += (text.empty() ? "\"" : ", \"") + candidates[place].name + "\" (#" +
+            std::to_string(candidates[place].uniqueID) + ")";
+  }
+  return text;
+}
+
+std::vector<size_t> AllPlaces(size_t count) {
+  std::vector<size_t> places;
+  for (size_t i = 0; i < count; ++i) {
+    places.push_back(i);
+  }
+  return places;
+}
+
+std::vector<size_t> FindByName(std::vector<Candidate> const& candidates, UString const& wanted) {
+  std::vector<size_t> found;
+  for (Fits const fits : kWaysToFit) {
+    for (size_t i = 0; i < candidates.size(); ++i) {
+      if (fits(UString(candidates[i].name), wanted)) {
+        found.push_back(i);
+      }
+    }
+    if (!found.empty()) {
+      break;
+    }
+  }
+  return found;
+}
+
+std::vector<size_t> FindByID(std::vector<Candidate> const& candidates, std::string const& wanted) {
+  std::vector<size_t> found;
+  for (size_t i = 0; i < candidates.size(); ++i) {
+    if (wanted == "#" + std::to_string(candidates[i].uniqueID)) {
+      found.push_back(i);
+    }
+  }
+  return found;
+}
+
+}  // namespace
+
+size_t MatchName(std::vector<Candidate> const& candidates, std::string const& wanted,
+                 std::string const& kind) {
+  if (wanted.empty()) {
+    throw UsageError("the name of a " + kind + " is empty");
+  }
+  std::vector<size_t> found = FindByName(candidates, UString(wanted));
+  if (found.empty()) {
+    found = FindByID(candidates, wanted);
+  }
+  if (found.size() == 1) {
+    return found.front();
+  }
+  if (!found.empty()) {
+    throw Failure("more than one " + kind + " fits \"" + wanted +
+                  "\": " + Listed(candidates, found));
+  }
+  if (candidates.empty()) {
+    throw Failure("there is no " + kind + " \"" + wanted + "\", nor any other");
+  }
+  throw Failure("there is no " + kind + " \"" + wanted + "\", only " +
+                Listed(candidates, AllPlaces(candidates.size())));
+}
+
+}  // namespace Ostinet::Tool

@@ -1,0 +1,131 @@
+// SPDX-License-Identifier: MIT
+#include "Session.h"
+
+#include <filesystem>
+
+#include "Errors.h"
+#include "Interrupt.h"
+#include "Output.h"
+#include "Studio.h"
+
+namespace Ostinet::Tool {
+namespace {
+
+struct SignInFault {
+  Setup::SignInResult result;
+  char const* sentence;
+};
+
+constexpr SignInFault kSignInFaults[] = {
+    {Setup::kSignInAlreadySignedIn, "the MIDI system is in use already"},
+    {Setup::kSignInPlatformError, "the MIDI system could not be started"},
+    {Setup::kSignInNoMasterClock, "the MIDI system has no clock"},
+    {Setup::kSignInCoarseMasterClock, "the clock of the MIDI system is coarser than a millisecond"},
+};
+
+std::string SignInSentence(Setup::SignInResult result) {
+  for (SignInFault const& fault : kSignInFaults) {
+    if (fault.result == result) {
+      return fault.sentence;
+    }
+  }
+  return "signing in to the MIDI system failed with result " + std::to_string(result);
+}
+
+Folder FolderAt(std::string const& path) {
+  std::u8string const text(path.begin(), path.end());
+  std::u16string const full = std::filesystem::absolute(std::filesystem::path(text)).u16string();
+  return Folder(FileSpecification(UString(full)));
+}
+
+// A folder that the user named has to work. Without the user's own one the program still runs.
+std::unique_ptr<FolderPrefs> OpenSettings(std::string const& path) {
+  Folder const folder = path.empty() ? FolderPrefs::UserFolder("Ostinet") : FolderAt(path);
+  if (!folder.IsValid()) {
+    return nullptr;
+  }
+  auto prefs = std::make_unique<FolderPrefs>(folder);
+  try {
+    prefs->EnsureFolder();
+  } catch (std::exception const& error) {
+    std::string const sentence = "the settings folder \"" + folder.GetFullPath().string() +
+                                 "\" cannot be written to: " + error.what();
+    if (!path.empty()) {
+      throw Failure(sentence);
+    }
+    Notify(sentence + "; going on without settings");
+    return nullptr;
+  }
+  return prefs;
+}
+
+void NotifyError(std::exception_ptr const& error) {
+  try {
+    std::rethrow_exception(error);
+  } catch (std::exception const& exception) {
+    Notify(exception.what());
+  } catch (...) {
+    Notify("an unknown error");
+  }
+}
+
+PollLoop::Options LoopOptions() {
+  PollLoop::Options options;
+  options.onError = NotifyError;
+  return options;
+}
+
+// The library chooses its system at the first call, so the studio comes before all else.
+std::unique_ptr<FolderPrefs> Prepare(GlobalOptions const& options) {
+  ChooseStudio(options.studio);
+  return OpenSettings(options.settings);
+}
+
+}  // namespace
+
+Session::Session(GlobalOptions const& options, Receiver* receiver, SetupListener* listener)
+    : prefs_(Prepare(options)), loop_(LoopOptions()), callbacks_([this] { loop_.Hurry(); }) {
+  std::string const why = WhyNoMIDI(options.studio);
+  if (!why.empty()) {
+    Notify(why);
+  }
+  SignIn(receiver, listener);
+}
+
+void Session::SignIn(Receiver* receiver, SetupListener* listener) {
+  Setup& setup = GetSetup();
+  Setup::SignInResult const result = setup.SignIn("ostinet", receiver, prefs_.get());
+  if (result != Setup::kSignInOK) {
+    setup.SignOut(false);
+    throw Failure(SignInSentence(result));
+  }
+  setup.SetListener(listener);
+}
+
+Session::~Session() {
+  try {
+    GetSetup().SetListener(nullptr);
+    GetSetup().SignOut(false);
+  } catch (std::exception const& error) {
+    Notify(error.what());
+  }
+  if (prefs_ != nullptr && !prefs_->LastError().empty()) {
+    Notify("settings could not be kept: " + prefs_->LastError());
+  }
+}
+
+void Session::Run(std::function<bool()> const& goOn) {
+  loop_.Run([&] { return !IsInterrupted() && goOn(); });
+}
+
+void Session::RunFor(PollLoop::Duration duration) {
+  auto const end = PollLoop::Clock::now() + duration;
+  Run([&] { return PollLoop::Clock::now() < end; });
+}
+
+bool Limits::AreReached(PollLoop::Clock::time_point start, long long printed) const {
+  std::chrono::duration<double> const passed = PollLoop::Clock::now() - start;
+  return (seconds && passed.count() >= *seconds) || (count && printed >= *count);
+}
+
+}  // namespace Ostinet::Tool

@@ -1,0 +1,64 @@
+// SPDX-License-Identifier: MIT
+#include <nlohmann/json.hpp>
+
+#include "StudioText.h"
+
+// The keys are a promise to scripts: docs/tool.md lists them, and more may come, but none goes.
+
+namespace Ostinet::Tool {
+namespace {
+
+using Json = nlohmann::ordered_json;
+
+template <class View, class ToJson>
+Json Array(std::vector<View> const& views, ToJson toJson) {
+  Json array = Json::array();
+  for (View const& view : views) {
+    array.push_back(toJson(view));
+  }
+  return array;
+}
+
+Json EndpointJson(EndpointView const& endpoint) {
+  return {{"name", endpoint.name},
+          {"uniqueID", endpoint.uniqueID},
+          {"direct", endpoint.direct},
+          {"online", endpoint.online},
+          {"software", endpoint.software},
+          {"internalSoftware", endpoint.internalSoftware},
+          {"virtual", endpoint.isVirtual},
+          {"private", endpoint.isPrivate},
+          {"channels", endpoint.channels},
+          {"isInterface", endpoint.isInterface ? Json(*endpoint.isInterface) : Json()},
+          {"scheduleAheadMuSec", endpoint.scheduleAheadMuSec},
+          {"port", endpoint.port ? Json(*endpoint.port) : Json()},
+          {"connected", endpoint.connected}};
+}
+
+Json EntityJson(EntityView const& entity) {
+  return {{"name", entity.name},
+          {"uniqueID", entity.uniqueID},
+          {"sources", Array(entity.sources, EndpointJson)},
+          {"destinations", Array(entity.destinations, EndpointJson)}};
+}
+
+Json DeviceJson(DeviceView const& device) {
+  return {{"name", device.name},
+          {"uniqueID", device.uniqueID},
+          {"manufacturer", device.manufacturer},
+          {"model", device.model},
+          {"direct", device.direct},
+          {"online", device.online},
+          {"entities", Array(device.entities, EntityJson)}};
+}
+
+}  // namespace
+
+std::string StudioJSON(StudioView const& view) {
+  Json const studio = {{"devices", Array(view.devices, DeviceJson)},
+                       {"sources", Array(view.sources, EndpointJson)},
+                       {"destinations", Array(view.destinations, EndpointJson)}};
+  return studio.dump(2, ' ', false, Json::error_handler_t::replace);
+}
+
+}  // namespace Ostinet::Tool

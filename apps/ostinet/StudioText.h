@@ -1,0 +1,20 @@
+// SPDX-License-Identifier: MIT
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "StudioView.h"
+
+namespace Ostinet::Tool {
+
+/// The studio as a tree for people, one line an element.
+std::vector<std::string> StudioLines(StudioView const& view);
+
+/// The studio as one JSON object, indented.
+std::string StudioJSON(StudioView const& view);
+
+/// "1-4, 10" for a mask of channels, of which bit 0 is channel 1; "none" for 0.
+std::string ChannelsText(unsigned short mask);
+
+}  // namespace Ostinet::Tool

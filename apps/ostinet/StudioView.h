@@ -1,0 +1,78 @@
+// SPDX-License-Identifier: MIT
+#pragma once
+
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace Ostinet {
+class Setup;
+}
+
+namespace Ostinet::Tool {
+
+// The studio as plain values, taken at one moment. Listings, JSON and the search for changes all
+// read this, so the walk over the model is made in one place. Texts are UTF-8.
+
+struct EndpointView {
+  unsigned long long key = 0;  ///< the same for the same object as long as the program runs
+  bool isSource = false;
+  std::string name;
+  int uniqueID = 0;
+  bool direct = false;
+  bool online = false;
+  bool software = false;
+  bool internalSoftware = false;
+  bool isVirtual = false;
+  bool isPrivate = false;
+  unsigned short channels = 0;  ///< bit 0 is channel 1
+  std::optional<bool> isInterface;
+  int scheduleAheadMuSec = 0;
+  std::optional<std::string> port;     ///< of an instrument: the port that it hangs on
+  std::vector<std::string> connected;  ///< of a port: what hangs on it
+
+  bool operator==(EndpointView const&) const = default;
+};
+
+struct EntityView {
+  unsigned long long key = 0;
+  std::string name;
+  int uniqueID = 0;
+  bool online = false;
+  std::vector<EndpointView> sources;
+  std::vector<EndpointView> destinations;
+};
+
+struct DeviceView {
+  unsigned long long key = 0;
+  std::string name;
+  int uniqueID = 0;
+  std::string manufacturer;
+  std::string model;
+  bool direct = false;
+  bool online = false;
+  std::vector<EntityView> entities;
+};
+
+struct StudioView {
+  std::vector<DeviceView> devices;
+  std::vector<EndpointView> sources;       ///< those without an entity, public ones first
+  std::vector<EndpointView> destinations;  ///< likewise
+};
+
+/// Looks at the whole studio. On the polling thread.
+StudioView ViewStudio(Setup const& setup);
+
+/// Which part of a studio is asked for.
+struct ViewFilter {
+  bool sources = true;
+  bool destinations = true;
+  bool withoutEntity = true;  ///< also endpoints that belong to no device
+  bool onlyConnected = false;
+};
+
+/// The part that passes. A device or entity of which no endpoint passes is left out, unless
+/// nothing of it was to be left out.
+StudioView Filtered(StudioView view, ViewFilter const& filter);
+
+}  // namespace Ostinet::Tool

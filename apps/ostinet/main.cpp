@@ -1,0 +1,77 @@
+// SPDX-License-Identifier: MIT
+#include <CLI/CLI.hpp>
+#include <iostream>
+
+#include "Commands.h"
+#include "Errors.h"
+#include "Interrupt.h"
+#include "Output.h"
+
+namespace Ostinet::Tool {
+namespace {
+
+void AddGlobals(CLI::App& app, GlobalOptions& options) {
+  app.add_flag("--json", options.json, "Print JSON, with keys that stay as they are");
+  app.add_option("--studio", options.studio,
+                 "Run on the simulated studio of this JSON file, as OSTINET_STUDIO does")
+      ->type_name("FILE");
+  app.add_option("--settings", options.settings, "Where settings are kept, instead of the user's")
+      ->type_name("FOLDER");
+  app.set_version_flag("--version", OSTINET_TOOL_VERSION);
+}
+
+void Describe(CLI::App& app) {
+  app.description("ostinet: the MIDI studio on the command line");
+  app.footer(
+      "Names are taken exactly, else by an unambiguous beginning, else by an unambiguous part;"
+      "\n#123 is the unique ID 123. Channels count from 1 to 16."
+      "\nExit codes: 0 done, 1 failed or not found, 2 wrong usage.");
+  app.require_subcommand(1);
+  app.fallthrough();
+  app.allow_windows_style_options(false);
+}
+
+int Report(std::string const& sentence, int exitCode) {
+  Notify(sentence);
+  return exitCode;
+}
+
+int RunCommand(CommandLine const& line) {
+  try {
+    line.run();
+    return kExitDone;
+  } catch (OutputClosed const&) {
+    return kExitDone;
+  } catch (UsageError const& error) {
+    return Report(error.what(), kExitUsage);
+  } catch (std::exception const& error) {
+    return Report(error.what(), kExitFailed);
+  }
+}
+
+int Main(int argc, char** argv) {
+  KeepRunningOnClosedPipes();
+  CatchInterrupts();
+  CLI::App app;
+  CommandLine line;
+  Describe(app);
+  AddGlobals(app, line.options);
+  for (auto const add : {AddListCommand, AddWatchCommand, AddMonitorCommand, AddSendCommand,
+                         AddPanicCommand}) {
+    add(app, line);
+  }
+  try {
+    app.parse(argc, argv);
+  } catch (CLI::Success const& help) {
+    return app.exit(help, std::cout, std::cerr);
+  } catch (CLI::ParseError const& error) {
+    app.exit(error, std::cout, std::cerr);
+    return kExitUsage;
+  }
+  return RunCommand(line);
+}
+
+}  // namespace
+}  // namespace Ostinet::Tool
+
+int main(int argc, char** argv) { return Ostinet::Tool::Main(argc, argv); }
