@@ -1,8 +1,7 @@
 // SPDX-License-Identifier: MIT
-#include "ostinet/DeviceChanges.h"
-
 #include <gtest/gtest.h>
 
+#include "ostinet/DeviceChanges.h"
 #include "ostinet/SimulatedMIDI.h"
 
 namespace Ostinet {
