@@ -72,7 +72,7 @@ TEST_F(SendCommand, NamesTheCandidatesOfAnAmbiguousName) {
 }
 
 TEST_F(SendCommand, RefusesMalformedBytes) {
-  for (std::string const& words : {"90 3G 40", "90 3C", "3C 40", "903", "on 60", "on 200 1", "ch 17"}) {
+  for (char const* words : {"90 3G 40", "90 3C", "3C 40", "903", "on 60", "on 200 1", "ch 17"}) {
     ToolRun const run = Send({"Out 1", words});
     EXPECT_EQ(run.exitCode, kUsage) << words;
     EXPECT_EQ(run.out, "");
