@@ -27,10 +27,16 @@ TEST_F(SendCommand, SendsQuietly) {
 }
 
 TEST_F(SendCommand, TakesWordsInEveryForm) {
-  for (std::vector<std::string> const& words : std::vector<std::vector<std::string>>{
-           {"903C40"}, {"90", "3C", "40"}, {"on", "60", "100"}, {"off C4"}, {"pb", "-100"},
-           {"syx 41 10"}, {"--channel", "10", "on", "36", "100"}, {"pc", "5", "-c", "2", "pc", "6"},
-           {WriteFile("dump.syx", "\xF0\x41\xF7")}}) {
+  for (std::vector<std::string> const& words :
+       std::vector<std::vector<std::string>>{{"903C40"},
+                                             {"90", "3C", "40"},
+                                             {"on", "60", "100"},
+                                             {"off C4"},
+                                             {"pb", "-100"},
+                                             {"syx 41 10"},
+                                             {"--channel", "10", "on", "36", "100"},
+                                             {"pc", "5", "-c", "2", "pc", "6"},
+                                             {WriteFile("dump.syx", "\xF0\x41\xF7")}}) {
     std::vector<std::string> arguments = {"Out 1"};
     arguments.insert(arguments.end(), words.begin(), words.end());
     ToolRun const run = Send(arguments);
@@ -63,9 +69,10 @@ TEST_F(SendCommand, FailsForADestinationThatIsNotThere) {
 }
 
 TEST_F(SendCommand, NamesTheCandidatesOfAnAmbiguousName) {
-  ToolRun const run = RunOn(R"({ "ports": [ {"name": "Port A", "kind": "winmm-out", "technology": 1},
+  ToolRun const run =
+      RunOn(R"({ "ports": [ {"name": "Port A", "kind": "winmm-out", "technology": 1},
                                             {"name": "Port B", "kind": "winmm-out", "technology": 1} ] })",
-                            {"send", "Port", "F8"});
+            {"send", "Port", "F8"});
   EXPECT_EQ(run.exitCode, kFailed);
   EXPECT_THAT(run.err, HasSubstr("\"Port A\""));
   EXPECT_THAT(run.err, HasSubstr("\"Port B\""));

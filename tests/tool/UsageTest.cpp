@@ -13,9 +13,13 @@ using testing::HasSubstr;
 class Usage : public ToolTest {};
 
 TEST_F(Usage, HelpGoesToTheStandardOutput) {
-  for (std::vector<std::string> const& arguments : std::vector<std::vector<std::string>>{
-           {"--help"}, {"list", "--help"}, {"watch", "--help"}, {"monitor", "--help"},
-           {"send", "--help"}, {"panic", "--help"}}) {
+  for (std::vector<std::string> const& arguments :
+       std::vector<std::vector<std::string>>{{"--help"},
+                                             {"list", "--help"},
+                                             {"watch", "--help"},
+                                             {"monitor", "--help"},
+                                             {"send", "--help"},
+                                             {"panic", "--help"}}) {
     ToolRun const run = RunBare(arguments);
     EXPECT_EQ(run.exitCode, kDone);
     EXPECT_THAT(run.out, HasSubstr("--"));
@@ -31,9 +35,15 @@ TEST_F(Usage, HelpNamesEachCommand) {
 }
 
 TEST_F(Usage, WrongUsageEndsWithTwo) {
-  for (std::vector<std::string> const& arguments : std::vector<std::vector<std::string>>{
-           {}, {"dance"}, {"list", "--no-such-option"}, {"list", "surplus"}, {"watch", "--for", "x"},
-           {"watch", "--for", "-1"}, {"watch", "--count", "0"}, {"monitor", "--count"}}) {
+  for (std::vector<std::string> const& arguments :
+       std::vector<std::vector<std::string>>{{},
+                                             {"dance"},
+                                             {"list", "--no-such-option"},
+                                             {"list", "surplus"},
+                                             {"watch", "--for", "x"},
+                                             {"watch", "--for", "-1"},
+                                             {"watch", "--count", "0"},
+                                             {"monitor", "--count"}}) {
     ToolRun const run = RunBare(arguments);
     EXPECT_EQ(run.exitCode, kUsage);
     EXPECT_EQ(run.out, "");
@@ -63,7 +73,8 @@ TEST_F(Usage, AStudioFileThatIsNotThereFails) {
 }
 
 TEST_F(Usage, AStudioFileThatDoesNotParseFails) {
-  for (char const* text : {"", "{", "[1]", R"({"ports": 5})", R"({"ports": [{"name": "A", "kind": "no"}]})"}) {
+  for (char const* text :
+       {"", "{", "[1]", R"({"ports": 5})", R"({"ports": [{"name": "A", "kind": "no"}]})"}) {
     ToolRun const run = RunOn(text, {"list"});
     EXPECT_EQ(run.exitCode, kFailed) << text;
     EXPECT_EQ(run.out, "");
@@ -73,8 +84,8 @@ TEST_F(Usage, AStudioFileThatDoesNotParseFails) {
 
 TEST_F(Usage, ASettingsFolderThatCannotBeWrittenFails) {
   std::string const notAFolder = WriteFile("file", "content");
-  ToolRun const run = RunBare({"list", "--studio", WriteFile("studio.json", kCabledStudio),
-                               "--settings", notAFolder});
+  ToolRun const run = RunBare(
+      {"list", "--studio", WriteFile("studio.json", kCabledStudio), "--settings", notAFolder});
   EXPECT_EQ(run.exitCode, kFailed);
   EXPECT_EQ(run.out, "");
   EXPECT_THAT(run.err, HasSubstr("the settings folder"));
@@ -89,8 +100,8 @@ TEST_F(Usage, MakesTheSettingsFolderWithThoseAboveIt) {
 
 TEST_F(Usage, TheEnvironmentChoosesAStudioToo) {
   std::string const studio = WriteFile("studio.json", kCabledStudio);
-  std::string const set = IsPOSIX() ? "OSTINET_STUDIO=\"" + studio + "\" "
-                                    : "set \"OSTINET_STUDIO=" + studio + "\"&& ";
+  std::string const set =
+      IsPOSIX() ? "OSTINET_STUDIO=\"" + studio + "\" " : "set \"OSTINET_STUDIO=" + studio + "\"&& ";
   std::string const list = "PROGRAM list --json --settings \"" + PathOf("settings") + "\"";
   ToolRun const run = RunShell(set + list);
   ASSERT_EQ(run.exitCode, kDone) << run.err;
@@ -99,8 +110,8 @@ TEST_F(Usage, TheEnvironmentChoosesAStudioToo) {
 
 TEST_F(Usage, ABadStudioOfTheEnvironmentFails) {
   std::string const studio = WriteFile("studio.json", "{");
-  std::string const set = IsPOSIX() ? "OSTINET_STUDIO=\"" + studio + "\" "
-                                    : "set \"OSTINET_STUDIO=" + studio + "\"&& ";
+  std::string const set =
+      IsPOSIX() ? "OSTINET_STUDIO=\"" + studio + "\" " : "set \"OSTINET_STUDIO=" + studio + "\"&& ";
   ToolRun const run = RunShell(set + "PROGRAM list --settings \"" + PathOf("settings") + "\"");
   EXPECT_EQ(run.exitCode, kFailed);
   EXPECT_EQ(std::count(run.err.begin(), run.err.end(), '\n'), 1) << run.err;
@@ -115,9 +126,9 @@ TEST_F(Usage, AClosedPipeEndsQuietly) {
       "ports": [ {"name": "Out 1", "kind": "winmm-out"}, {"name": "In 1", "kind": "winmm-in"} ],
       "events": [ {"at-ms": 500, "input": {"port": "In 1", "bytes": "90 3C 40"}} ] })");
   auto const start = std::chrono::steady_clock::now();
-  ToolRun const run = RunShell("{ PROGRAM monitor --for 60 --studio \"" + studio +
-                               "\" --settings \"" + PathOf("settings") +
-                               "\"; echo \"exit $?\" >&2; } | true");
+  ToolRun const run =
+      RunShell("{ PROGRAM monitor --for 60 --studio \"" + studio + "\" --settings \"" +
+               PathOf("settings") + "\"; echo \"exit $?\" >&2; } | true");
   EXPECT_EQ(run.err, "exit 0\n");
   EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(50));
 }
