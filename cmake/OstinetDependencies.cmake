@@ -2,7 +2,8 @@
 # Everything from outside, found once for all folders:
 #
 #   Boost::headers  EXPAT::EXPAT  utf8proc::utf8proc  nlohmann_json::nlohmann_json  CLI11::CLI11
-#   Threads::Threads  GTest::gmock_main  benchmark::benchmark  RtMidi::RtMidi (not on Windows)
+#   Threads::Threads  GTest::gmock_main  benchmark::benchmark
+#   RtMidi::RtMidi  Jack::Jack (not on Windows)
 #
 # The Windows build finds its own in build/windows-deps, where scripts/windows-dependencies puts
 # them; the toolchain file sees to it that nothing of the building machine is found instead.
@@ -46,6 +47,14 @@ else()
   set_target_properties(RtMidi::RtMidi PROPERTIES
     IMPORTED_LOCATION ${RTMIDI_LIBRARY}
     INTERFACE_INCLUDE_DIRECTORIES ${RTMIDI_INCLUDE_DIR})
+
+  find_path(JACK_INCLUDE_DIR jack/jack.h REQUIRED)
+  find_library(JACK_LIBRARY jack REQUIRED)
+  mark_as_advanced(JACK_INCLUDE_DIR JACK_LIBRARY)
+  add_library(Jack::Jack UNKNOWN IMPORTED)
+  set_target_properties(Jack::Jack PROPERTIES
+    IMPORTED_LOCATION ${JACK_LIBRARY}
+    INTERFACE_INCLUDE_DIRECTORIES ${JACK_INCLUDE_DIR})
 endif()
 
 if(OSTINET_BUILD_TESTS)

@@ -15,6 +15,8 @@ namespace Ostinet::SystemServices {
 
 /// The value of an environment variable; nothing if it is not set or empty.
 std::optional<UString> Environment(char const* name);
+/// Sets a variable of this process; an empty value removes it. While no other thread reads one.
+void SetEnvironment(char const* name, UString const& value);
 
 /// The folder that the library, or the program that it is linked into, was loaded from. Empty if
 /// the system does not tell.

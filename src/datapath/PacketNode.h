@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <atomic>
+#include <cstddef>
 #include <memory>
 
 #include "datapath/SysexImpl.h"
@@ -8,36 +10,46 @@
 
 namespace Ostinet::Impl {
 
-/// One packet in a queue. Its bytes are those of a sysex message, or a copy: up to kInlineBytes
-/// within the node, more of them on the heap.
-///
-/// Ownership  Nodes come from one pool of the process, through the two functions named Make, and go
-///            back through Free.
-/// Threads    Any; one node belongs to one thread at a time.
+/// A place for one packet in a queue. The packet's bytes are those of a sysex message, or a copy:
+/// up to kInlineBytes within the node, more of them on the heap.
 struct PacketNode {
   static constexpr std::size_t kInlineBytes = 16;
 
-  static PacketNode* Make(DataPacket const& packet);
-  static PacketNode* Make(TimeStamp const& stamp, RCPtrMT<SysexImpl> const& sysex);
-  static void Free(PacketNode* node);
+  /// Lets go of what the packet's bytes need.
+  void Release() {
+    // Most packets need nothing: two looks are cheaper than two calls.
+    if (sysex.get() != nullptr) {
+      sysex = nullptr;
+    }
+    if (heapBytes != nullptr) {
+      heapBytes.reset();
+    }
+  }
 
-  /// A view of the node's bytes, valid until it is freed.
-  DataPacket View() const;
-
-  void* next = nullptr;  // the first word, where the lock-free stack keeps its link
-  TimeStamp stamp;
-  unsigned long long length = 0;  // of the copy
+  // Stored once by the producer, with release, when the packet is complete; loaded by the consumer,
+  // with acquire, before it looks at the packet.
+  std::atomic<bool> arrived{false};
+  DataPacket packet;
   RCPtrMT<SysexImpl> sysex;
   std::unique_ptr<unsigned char[]> heapBytes;
   unsigned char inlineBytes[kInlineBytes];
 };
 
-static_assert(sizeof(void*) != 8 || sizeof(PacketNode) == 72, "nine words");
+/// As many places as a queue takes at a time, and the link to the next ones.
+///
+/// Ownership  Segments come from one pool of the process through Make and go back through Free,
+///            which does not look at the nodes: they are released by then.
+/// Threads    Make and Free on any thread.
+struct alignas(16) PacketSegment {
+  static constexpr std::size_t kNodes = 16;
 
-/// Frees the node at the end of a scope.
-struct PacketNodeDeleter {
-  void operator()(PacketNode* node) const { PacketNode::Free(node); }
+  /// A segment of empty places. Throws std::bad_alloc.
+  static PacketSegment* Make();
+  static void Free(PacketSegment* segment);
+
+  // Stored once, with release, by the producer that made the next segment; loaded by the consumer.
+  std::atomic<PacketSegment*> next{nullptr};
+  PacketNode nodes[kNodes];
 };
-using PacketNodePtr = std::unique_ptr<PacketNode, PacketNodeDeleter>;
 
 }  // namespace Ostinet::Impl

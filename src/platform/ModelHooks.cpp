@@ -8,6 +8,7 @@
 #include "model/DeviceImpl.h"
 #include "model/EntityImpl.h"
 #include "model/PropertyKeys.h"
+#include "platform/SetupFileReader.h"
 #include "platform/WinMIDIImplImpl.h"
 #include "platform/WinMIDISetup.h"
 
@@ -21,6 +22,10 @@ WinMIDIImplImpl* PeerOf(DeviceObjectImpl const& object) {
 }
 
 }  // namespace
+
+RCPtrMT<DeviceImpl> WinMIDISetup::PlatformCreateDevice(XMLLib::Parser& parser) {
+  return SetupFileReader(*this, parser, SetupFileReader::kImport).ReadDevice();
+}
 
 RCPtrMT<DeviceImpl> WinMIDISetup::PlatformCreateDevice(DeviceTypeInfoImpl*, UString const& name) {
   RCPtrMT<DeviceImpl> device(

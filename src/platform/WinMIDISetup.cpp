@@ -11,6 +11,7 @@
 #include "ostinet/core/Error.h"
 #include "platform/PortAttacher.h"
 #include "platform/Reconciliation.h"
+#include "platform/SetupFile.h"
 #include "platform/ports/WinDMusMIDIInPort.h"
 #include "platform/ports/WinLegacyMIDIInPort.h"
 #include "platform/ports/WinMIDIVirtSource.h"
@@ -83,7 +84,15 @@ void WinMIDISetup::StopSession() {
   pollFuture_.reset();
 }
 
+void WinMIDISetup::SaveDevices() {
+  // A studio that was never loaded must not take the place of the one in the file.
+  if (isLoaded_) {
+    SaveSetupFile(*this);
+  }
+}
+
 void WinMIDISetup::PlatformSignOut() {
+  isLoaded_ = false;
   for (auto const& source : activeSources_) {
     if (WinMIDIPort* const port = WinMIDIPort::Of(*source)) {
       port->Detach();
@@ -103,6 +112,8 @@ void WinMIDISetup::PlatformLoadSetup() {
   System& system = session->GetSystem();
   // Opening a synthesizer makes audio sessions of this process: those that came in between.
   std::vector<AudioSession> const before = system.SnapshotAudioSessions();
+  LoadSetupFile(*this);
+  isLoaded_ = true;
   PortAttacher attacher(*this, session);
   for (PortInfo const& port : EnumeratePorts(system, *session->DirectMusic().get())) {
     attacher.Attach(port);

@@ -30,6 +30,9 @@ class WinMIDISetup : public Setup, public WinMIDIDevicesListener {
   void MarkChanged() { setupChanged_ = true; }
   Studio& Lists() { return GetStudio(); }
   void AssignUniqueID(DeviceObjectImpl& object) { MaybeAssignUniqueID(object); }
+  void ImportConnection(XMLLib::Parser& parser, ImplImpl& peer, bool isSource) {
+    HandleImportConnection(parser, peer, isSource);
+  }
   /// Puts a source on the list that ProcessInput walks, once.
   void AddActiveSource(RCPtrMT<EndpointImpl> const& source);
 
@@ -40,6 +43,7 @@ class WinMIDISetup : public Setup, public WinMIDIDevicesListener {
 
  protected:
   int PlatformSignIn(UString const& name) override;
+  void SaveDevices() override;
   void PlatformSignOut() override;
   void PlatformLoadSetup() override;
   bool PlatformPollSetupChanges(bool& connectionsChanged) override;
@@ -86,6 +90,7 @@ class WinMIDISetup : public Setup, public WinMIDIDevicesListener {
   std::vector<RCPtrMT<EndpointImpl>> activeSources_;
   PendingChanges pendingChanges_;
   bool setupChanged_ = false;
+  bool isLoaded_ = false;  // in this signed-in period
   std::shared_ptr<VantorJobThread> pollThread_;
 };
 

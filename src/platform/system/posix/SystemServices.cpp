@@ -42,6 +42,14 @@ std::optional<UString> Environment(char const* name) {
   return UString(value);
 }
 
+void SetEnvironment(char const* name, UString const& value) {
+  if (value.empty()) {
+    ::unsetenv(name);
+  } else {
+    ::setenv(name, value.string().c_str(), 1);
+  }
+}
+
 std::filesystem::path LibraryFolder() {
   Dl_info info{};
   if (::dladdr(reinterpret_cast<void*>(&AnchorForAddress), &info) == 0 ||

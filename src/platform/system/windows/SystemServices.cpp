@@ -22,6 +22,8 @@ std::wstring WideEnvironment(std::wstring const& name) {
   return length < kLongestPath ? std::wstring(text.data(), length) : std::wstring();
 }
 
+std::wstring Widened(std::string const& name) { return {name.begin(), name.end()}; }
+
 int LastError() { return static_cast<int>(::GetLastError()); }
 
 HANDLE HandleOf(std::intptr_t handle) { return reinterpret_cast<HANDLE>(handle); }
@@ -29,12 +31,16 @@ HANDLE HandleOf(std::intptr_t handle) { return reinterpret_cast<HANDLE>(handle);
 }  // namespace
 
 std::optional<UString> Environment(char const* name) {
-  std::string const bytes(name);
-  std::wstring const value = WideEnvironment(std::wstring(bytes.begin(), bytes.end()));
+  std::wstring const value = WideEnvironment(Widened(name));
   if (value.empty()) {
     return std::nullopt;
   }
   return UString(value.c_str());
+}
+
+void SetEnvironment(char const* name, UString const& value) {
+  std::wstring const text(value.begin(), value.end());
+  ::SetEnvironmentVariableW(Widened(name).c_str(), text.empty() ? nullptr : text.c_str());
 }
 
 std::filesystem::path LibraryFolder() {
