@@ -97,6 +97,32 @@ TEST_F(SendCommand, FailsForASysexFileThatCannotBeRead) {
   EXPECT_THAT(run.err, HasSubstr("missing.syx"));
 }
 
+// The message of an hour from now cannot have gone out.
+TEST_F(SendCommand, FailsWhereItIsInterruptedBeforeTheEnd) {
+  if (!IsPOSIX()) {
+    GTEST_SKIP() << "needs a program that sends interrupts";
+  }
+  std::string const studio = WriteFile("studio.json", kCabledStudio);
+  ToolRun const run = RunShell(
+      "timeout --preserve-status -s INT 2 PROGRAM send 'Out 1' F8 +3600000 FA --studio \"" +
+      studio + "\" --settings \"" + PathOf("settings") + "\"");
+  EXPECT_EQ(run.exitCode, kFailed);
+  EXPECT_EQ(run.err, "ostinet: interrupted before all messages had gone out\n");
+}
+
+// More than a port's queue holds at once: what did not fit would be lost.
+TEST_F(SendCommand, LosesNothingOfALongSchedule) {
+  std::string words = "Out 1:";
+  for (int i = 0; i < 600; ++i) {
+    words += " +" + std::to_string(i) + " on " + std::to_string(i % 128) + " 1";
+  }
+  ToolRun const run =
+      RunOn(kCabledStudio, {"monitor", "--json", "--for", "60", "--count", "600", "--send", words});
+  auto const lines = run.JSONLines();
+  ASSERT_EQ(lines.size(), 600u) << run.err;
+  EXPECT_EQ(lines[599]["bytes"], "90 57 01");
+}
+
 TEST_F(SendCommand, PanicSilencesEverythingAndEnds) {
   ToolRun const run = RunOn(kCabledStudio, {"panic"});
   EXPECT_EQ(run.exitCode, kDone) << run.err;

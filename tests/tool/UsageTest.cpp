@@ -2,6 +2,7 @@
 #include <gmock/gmock.h>
 
 #include <chrono>
+#include <filesystem>
 
 #include "RunTool.h"
 
@@ -96,6 +97,44 @@ TEST_F(Usage, MakesTheSettingsFolderWithThoseAboveIt) {
   ToolRun const run = RunBare({"list", "--studio", WriteFile("studio.json", kCabledStudio),
                                "--settings", PathOf("a") + "/b/c"});
   EXPECT_EQ(run.exitCode, kDone) << run.err;
+}
+
+TEST_F(Usage, GoesOnWithoutTheUsersOwnSettingsWhereTheyCannotBeKept) {
+  if (!IsPOSIX()) {
+    GTEST_SKIP() << "needs a folder that nobody can write to";
+  }
+  ToolRun const run = RunShell("XDG_CONFIG_HOME=/dev/null PROGRAM list --json --studio \"" +
+                               WriteFile("studio.json", kCabledStudio) + "\"");
+  EXPECT_EQ(run.exitCode, kDone);
+  EXPECT_EQ(nlohmann::json::parse(run.out)["sources"].size(), 1u);
+  EXPECT_THAT(run.err, HasSubstr("going on without settings"));
+}
+
+TEST_F(Usage, KeepsTheUsersOwnSettingsInTheirPlace) {
+  if (!IsPOSIX()) {
+    GTEST_SKIP() << "sets a variable as a POSIX shell does";
+  }
+  ToolRun const run =
+      RunShell("XDG_CONFIG_HOME=\"" + PathOf("config") + "\" PROGRAM list --studio \"" +
+               WriteFile("studio.json", kCabledStudio) + "\"");
+  EXPECT_EQ(run.exitCode, kDone) << run.err;
+  EXPECT_TRUE(std::filesystem::is_directory(PathOf("config") + "/ostinet"));
+}
+
+// Whether the machine of the test has MIDI or not: data stays clean, and a notice is one line that
+// says what to do.
+TEST_F(Usage, SaysOnceWhereTheMachineHasNoMIDI) {
+  if (!IsPOSIX()) {
+    GTEST_SKIP() << "unsets a variable as a POSIX shell does";
+  }
+  ToolRun const run = RunShell("env -u OSTINET_STUDIO PROGRAM list --json --settings \"" +
+                               PathOf("settings") + "\"");
+  EXPECT_EQ(run.exitCode, kDone) << run.err;
+  EXPECT_TRUE(nlohmann::json::parse(run.out).contains("devices"));
+  if (!run.err.empty()) {
+    EXPECT_THAT(run.err, HasSubstr("--studio FILE.json"));
+    EXPECT_EQ(std::count(run.err.begin(), run.err.end(), '\n'), 1) << run.err;
+  }
 }
 
 TEST_F(Usage, TheEnvironmentChoosesAStudioToo) {
