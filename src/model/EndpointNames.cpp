@@ -46,7 +46,7 @@ EndpointImpl::Place EndpointImpl::FindPlace() const {
   return place;
 }
 
-UString EndpointImpl::GetName() const {
+UString const& EndpointImpl::NameToShow() const {
   if (!name_) {
     name_ = BuildName();
   }
