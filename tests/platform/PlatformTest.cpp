@@ -54,6 +54,7 @@ PlatformTest::PlatformTest() : setup((OstinetCallbackAPI::gInstance = &Callbacks
 }
 
 PlatformTest::~PlatformTest() {
+  listener.patches.clear();  // handles, which would keep ports alive
   midi.ClearFaults();
   SignOut();
   setup.SetListener(nullptr);

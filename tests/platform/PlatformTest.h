@@ -10,7 +10,7 @@
 #include "ostinet/Setup.h"
 #include "ostinet/SimulatedMIDI.h"
 #include "platform/WinMIDISetup.h"
-#include "support/StudioTest.h"
+#include "support/Recorders.h"
 
 namespace Ostinet::Testing {
 
