@@ -68,8 +68,9 @@ void AddSendCommand(CLI::App& app, CommandLine& line) {
   CLI::App* const command = app.add_subcommand("send", "Send messages to a destination");
   command->add_option("DESTINATION", options->destination, "Its name, or an unambiguous part of it")
       ->required();
-  options->wordsOption = command->add_option(
-      "WORDS", options->words, "Bytes in hexadecimal, .syx files, and the verbs below, in any order");
+  options->wordsOption =
+      command->add_option("WORDS", options->words,
+                          "Bytes in hexadecimal, .syx files, and the verbs below, in any order");
   options->timesOption =
       AddRepeatable(*command, "--at", options->times,
                     "+MS: what follows goes out so many milliseconds after the start");

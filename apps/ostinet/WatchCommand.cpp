@@ -88,7 +88,8 @@ void AddWatchCommand(CLI::App& app, CommandLine& line) {
       app.add_subcommand("watch", "Print a line for each change of the studio");
   AddLimits(*command, *limits);
   command->footer("Ports that come and go, names, connections, patches. Ctrl-C ends it.");
-  command->callback([&line, limits] { line.run = [&line, limits] { Watch(line.options, *limits); }; });
+  command->callback(
+      [&line, limits] { line.run = [&line, limits] { Watch(line.options, *limits); }; });
 }
 
 }  // namespace Ostinet::Tool

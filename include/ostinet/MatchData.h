@@ -3,11 +3,18 @@
 
 #include <cstddef>
 #include <iterator>
+#include <memory>
+#include <optional>
 #include <vector>
 
 #include "ostinet/Common.h"
 
 namespace Ostinet {
+
+namespace Impl {
+class DeviceTextsByCode;
+class DeviceCodesByText;
+}  // namespace Impl
 
 /// What kind of object a reference names: the kObjectID of its class; 0 is none.
 enum MatchObjectID : int {};
@@ -20,6 +27,32 @@ struct OSTINET_EXPORT SlotID {
   SlotID();
   bool operator==(SlotID const& other) const;
   bool operator!=(SlotID const& other) const;
+};
+
+/// What a reference says of an endpoint. What it does not say, or what cannot be read, has the
+/// values below.
+///
+/// Ownership    A value.
+struct MatchContents {
+  /// True if the bytes hold a whole reference in the long form.
+  bool isValid = false;
+  /// Which backend wrote it.
+  Properties::Implementation implementation = Properties::kNoImplementation;
+  MatchObjectID objectType = MatchObjectID(0);
+  UString name;
+  /// Whether that is the name to show, as GetName has it; else it is that of GetRawName.
+  bool nameIsFull = true;
+  /// 0: none.
+  int uniqueID = 0;
+  /// Of the port that the instrument hung on; 0: none.
+  int connectionUniqueID = 0;
+  UString manufacturer;
+  UString model;
+  std::optional<bool> isDirect;
+  std::optional<bool> isSoftware;
+  std::optional<bool> supportsGeneralMIDI;
+  std::optional<bool> isInternalSoftware;
+  std::optional<SlotID> slot;
 };
 
 /// A persistent reference to an object of the studio: bytes that the host keeps in its documents
@@ -60,13 +93,21 @@ class OSTINET_EXPORT MatchData {
   char& at(size_t index);
   char const& at(size_t index) const;
 
+  /// Under which name the object was saved, also if what follows the name is cut off.
   UString GetObjectName() const;
+  /// What kind of object it was: its class's kObjectID, or 0 if that cannot be read.
   MatchObjectID GetObjectType() const;
+  /// True for an endpoint made by software. False for anything else and where nothing is said.
   bool ObjectIsSoftware() const;
+  /// True for an endpoint within the host.
   bool ObjectIsInternalSoftware() const;
+  /// The place of an endpoint within the host; all 0 where nothing is said.
   SlotID GetSlotID() const;
-  /// Replaces the slot of a reference that has room for one.
+  /// Replaces the slot of a reference that has room for one, as those of live endpoints have. Any
+  /// other stays as it is, and nobody is told.
   void SetSlotID(SlotID const& slot);
+  /// All that the reference says of an endpoint, for showing it and for searching by it.
+  MatchContents GetContents() const;
 
  private:
   std::vector<char> bytes_;
@@ -133,16 +174,28 @@ union BreviaDestinationMatch {
 };
 #pragma pack(pop)
 
-/// Turns references of other forms into MatchData, and back.
+/// Turns references of other forms into MatchData, and back. The numbers of makers and models in
+/// the older form are related to texts by the resource "BVDevices.xml", which is read when it is
+/// first needed, once by each translator and each direction: keep one for many references.
 ///
-/// Threads      The host's polling thread.
+/// Ownership    Not copied.
+/// Threads      One object on one thread at a time.
+/// Errors       None are thrown. Codes and texts that the file does not know give nothing.
 class OSTINET_EXPORT MatchTranslator {
  public:
   MatchTranslator();
   ~MatchTranslator();
-  MatchData TranslateFromBrevia(BreviaDestinationMatch const&, bool isSource);
-  BreviaDestinationMatch TranslateToBrevia(MatchData const&, bool& isSource);
-  MatchData TranslateFromNameOnly(MatchObjectID, UString const& name);
+  /// The reference keeps all fields of the record, so TranslateToBrevia gives the same record.
+  MatchData TranslateFromBrevia(BreviaDestinationMatch const& record, bool isSource);
+  /// `kind` is -1, and `isSource` stays as it was, for a reference to anything but an endpoint.
+  /// The name is cut at 255 characters; one beyond U+00FF becomes "?".
+  BreviaDestinationMatch TranslateToBrevia(MatchData const& data, bool& isSource);
+  /// A reference by which any object of that type and name can be found.
+  MatchData TranslateFromNameOnly(MatchObjectID type, UString const& name);
+
+ private:
+  std::unique_ptr<Impl::DeviceCodesByText> codesByText_;
+  std::unique_ptr<Impl::DeviceTextsByCode> textsByCode_;
 };
 
 }  // namespace Ostinet

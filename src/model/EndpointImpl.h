@@ -38,7 +38,9 @@ class EndpointImpl : public DeviceObjectImpl {
   EndpointImpl(std::unique_ptr<ImplImpl> peer, Setup& setup, EndpointKind const& kind);
   ~EndpointImpl() override;
 
-  UString GetName() const override;
+  UString GetName() const override { return NameToShow(); }
+  /// The same without a copy. It stays until the names of the studio change.
+  UString const& NameToShow() const;
   void Deactivate(bool fromParent) override;
   void SetName(UString const& name) override;
   bool IsOnline() const override;
@@ -84,7 +86,7 @@ class EndpointImpl : public DeviceObjectImpl {
  private:
   /// Where the endpoint stands among the endpoints of its direction in its entity.
   struct Place {
-    int index = -1;          // -1: in no entity
+    int index = -1;  // -1: in no entity
     bool hasSiblings = false;
   };
   Place FindPlace() const;
