@@ -30,18 +30,8 @@ template <class List>
 void SortByName(List& list) {
   std::stable_sort(list.begin(), list.end(),
                    [](auto const& a, auto const& b) { return a.name < b.name; });
-  auto const hasLater = [&list](auto const& item) {
-    auto const* const next = &item + 1;
-    return next != list.data() + list.size() && next->name == item.name;
-  };
-  List kept;
-  kept.reserve(list.size());
-  for (auto& item : list) {
-    if (!hasLater(item)) {
-      kept.push_back(std::move(item));
-    }
-  }
-  list.swap(kept);
+  auto const ofOneName = [](auto const& a, auto const& b) { return a.name == b.name; };
+  list.erase(list.begin(), std::unique(list.rbegin(), list.rend(), ofOneName).base());
 }
 
 template <class Endpoints>
