@@ -3,6 +3,7 @@
 #include "platform/Reconciliation.h"
 
 #include <algorithm>
+#include <cstddef>
 #include <utility>
 #include <vector>
 
@@ -21,6 +22,7 @@ template <class Thing>
 struct Named {
   UString name;
   Thing thing;
+  std::size_t order;  // in the list that it comes from
 };
 using PortsByName = std::vector<Named<PortInfo const*>>;
 using EndpointsByName = std::vector<Named<EndpointImpl*>>;
@@ -28,8 +30,10 @@ using EndpointsByName = std::vector<Named<EndpointImpl*>>;
 /// Of two things of one name the later one counts.
 template <class List>
 void SortByName(List& list) {
-  std::stable_sort(list.begin(), list.end(),
-                   [](auto const& a, auto const& b) { return a.name < b.name; });
+  // Ties are told by their order, which spares the copy that a stable sort works on.
+  std::sort(list.begin(), list.end(), [](auto const& a, auto const& b) {
+    return a.name < b.name || (!(b.name < a.name) && a.order < b.order);
+  });
   auto const ofOneName = [](auto const& a, auto const& b) { return a.name == b.name; };
   list.erase(list.begin(), std::unique(list.rbegin(), list.rend(), ofOneName).base());
 }
@@ -40,7 +44,7 @@ EndpointsByName ByName(Endpoints const& endpoints) {
   result.reserve(endpoints.size());
   for (auto const& endpoint : endpoints) {
     if (endpoint->IsDirect() && !endpoint->IsVirtual() && !endpoint->IsInternalSoftware()) {
-      result.push_back({endpoint->GetName(), endpoint.get()});
+      result.push_back({endpoint->GetName(), endpoint.get(), result.size()});
     }
   }
   SortByName(result);
@@ -101,8 +105,11 @@ bool Merge(PortAttacher& attacher, PortsByName const& ports, EndpointsByName con
 
 bool Reconcile(WinMIDISetup& setup, PortAttacher& attacher, PortList const& ports) {
   PortsByName newSources, newDestinations;
+  newSources.reserve(ports.size());
+  newDestinations.reserve(ports.size());
   for (PortInfo const& port : ports) {
-    (IsSource(port) ? newSources : newDestinations).push_back({NameOfPort(port), &port});
+    PortsByName& list = IsSource(port) ? newSources : newDestinations;
+    list.push_back({NameOfPort(port), &port, list.size()});
   }
   SortByName(newSources);
   SortByName(newDestinations);
