@@ -1,6 +1,5 @@
 // SPDX-License-Identifier: MIT
 #include <boost/optional/optional_io.hpp>
-#include <cstdlib>
 
 #include "core/SystemServices.h"
 #include "model/PropertyKeys.h"
@@ -18,7 +17,7 @@ using ::testing::IsEmpty;
 
 // The list of standalone devices is read once, so the folder is chosen before any test runs.
 bool const kResourcesAreChosen = [] {
-  SystemServices::SetEnvironment("OSTINET_RESOURCES", UString(OSTINET_MODEL_TEST_DATA));
+  SystemServices::SetEnvironment("OSTINET_RESOURCES", OSTINET_MODEL_TEST_DATA);
   return true;
 }();
 
