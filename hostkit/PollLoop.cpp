@@ -88,10 +88,10 @@ struct PollLoop::State {
     if (!calls) {
       calls = SetupCalls();
     }
-    PollSchedule schedule({options.inputPeriod, calls->pollInterval,
-                           calls->pollSetupChangesInterval, options.hurriedInterval,
-                           options.hurryLasts},
-                          Clock::now());
+    PollSchedule schedule(
+        {options.inputPeriod, calls->pollInterval, calls->pollSetupChangesInterval,
+         options.hurriedInterval, options.hurryLasts},
+        Clock::now());
     while (!goOn || goOn()) {
       Requests requests = WaitUntil(schedule.NextDue());
       if (requests.stopped) {

@@ -18,7 +18,8 @@ int DigitValue(char c) {
 }
 
 [[noreturn]] void FailWord(std::string_view word) {
-  throw UsageError("\"" + std::string(word) + "\" is not hexadecimal: expected bytes like 90 3C 40");
+  throw UsageError("\"" + std::string(word) +
+                   "\" is not hexadecimal: expected bytes like 90 3C 40");
 }
 
 void AppendWord(std::string_view word, Bytes& bytes) {

@@ -46,7 +46,8 @@ void AddListCommand(CLI::App& app, CommandLine& line) {
   command->add_flag("-l,--connections", options->connections, "Only what is connected");
   command->add_flag("-d,--devices", options->devices, "Only devices, without loose ports");
   command->footer("The options combine: \"list -l -o\" shows the connected outputs.");
-  command->callback([&line, options] { line.run = [&line, options] { List(line.options, *options); }; });
+  command->callback(
+      [&line, options] { line.run = [&line, options] { List(line.options, *options); }; });
 }
 
 }  // namespace Ostinet::Tool

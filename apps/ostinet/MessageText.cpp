@@ -22,22 +22,44 @@ struct ControllerName {
 };
 
 constexpr ControllerName kControllers[] = {
-    {0, "bank select"},     {1, "modulation"},         {2, "breath"},
-    {4, "foot"},            {5, "portamento time"},    {6, "data entry"},
-    {7, "volume"},          {8, "balance"},            {10, "pan"},
-    {11, "expression"},     {32, "bank select fine"},  {38, "data entry fine"},
-    {64, "sustain"},        {65, "portamento"},        {66, "sostenuto"},
-    {67, "soft pedal"},     {71, "resonance"},         {72, "release time"},
-    {73, "attack time"},    {74, "cutoff"},            {91, "reverb"},
-    {93, "chorus"},         {96, "data increment"},    {97, "data decrement"},
-    {98, "NRPN fine"},      {99, "NRPN"},              {100, "RPN fine"},
-    {101, "RPN"},           {120, "all sound off"},    {121, "reset controllers"},
-    {122, "local control"}, {123, "all notes off"},
+    {0, "bank select"},
+    {1, "modulation"},
+    {2, "breath"},
+    {4, "foot"},
+    {5, "portamento time"},
+    {6, "data entry"},
+    {7, "volume"},
+    {8, "balance"},
+    {10, "pan"},
+    {11, "expression"},
+    {32, "bank select fine"},
+    {38, "data entry fine"},
+    {64, "sustain"},
+    {65, "portamento"},
+    {66, "sostenuto"},
+    {67, "soft pedal"},
+    {71, "resonance"},
+    {72, "release time"},
+    {73, "attack time"},
+    {74, "cutoff"},
+    {91, "reverb"},
+    {93, "chorus"},
+    {96, "data increment"},
+    {97, "data decrement"},
+    {98, "NRPN fine"},
+    {99, "NRPN"},
+    {100, "RPN fine"},
+    {101, "RPN"},
+    {120, "all sound off"},
+    {121, "reset controllers"},
+    {122, "local control"},
+    {123, "all notes off"},
 };
 
 constexpr std::string_view kSystemNames[] = {
-    "sysex",        "time code",  "song position", "song select",  "undefined F4", "undefined F5",
-    "tune request", "end of sysex", "clock",       "undefined F9", "start",        "continue",
+    "sysex",        "time code",    "song position",  "song select",
+    "undefined F4", "undefined F5", "tune request",   "end of sysex",
+    "clock",        "undefined F9", "start",          "continue",
     "stop",         "undefined FD", "active sensing", "reset"};
 
 std::string Number(int value) { return std::to_string(value); }
@@ -59,7 +81,8 @@ std::string Padded(std::string text, size_t width) {
 }
 
 std::string Line(std::string name, unsigned char status, std::string const& rest) {
-  return Padded(std::move(name), kNameWidth) + Padded("ch " + Number((status & 0x0F) + 1), 7) + rest;
+  return Padded(std::move(name), kNameWidth) + Padded("ch " + Number((status & 0x0F) + 1), 7) +
+         rest;
 }
 
 std::string DescribeChannelMessage(Bytes const& message) {
@@ -84,9 +107,8 @@ std::string DescribeChannelMessage(Bytes const& message) {
 }
 
 std::string DescribeBytes(std::string name, Bytes const& bytes) {
-  Bytes const shown(bytes.begin(),
-                    bytes.begin() + static_cast<std::ptrdiff_t>(
-                                        std::min(bytes.size(), kMaxSysexBytesShown)));
+  Bytes const shown(bytes.begin(), bytes.begin() + static_cast<std::ptrdiff_t>(std::min(
+                                                       bytes.size(), kMaxSysexBytesShown)));
   return Padded(std::move(name), kNameWidth) + Number(static_cast<int>(bytes.size())) + " bytes  " +
          ToHex(shown) + (shown.size() < bytes.size() ? " ..." : "");
 }
@@ -147,7 +169,8 @@ std::string DescribeMessage(Bytes const& message) {
   if (!whole) {
     return DescribeBytes("piece", message);
   }
-  return message[0] < kSysexStart ? DescribeChannelMessage(message) : DescribeSystemMessage(message);
+  return message[0] < kSysexStart ? DescribeChannelMessage(message)
+                                  : DescribeSystemMessage(message);
 }
 
 }  // namespace Ostinet::Tool

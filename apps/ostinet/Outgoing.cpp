@@ -26,7 +26,8 @@ PollLoop::Duration Milliseconds(double ms) {
 }
 
 PollLoop::Duration WireTime(Destination const& destination, size_t bytes) {
-  double const seconds = destination.IsSoftware() ? 0 : static_cast<double>(bytes) * kSecondsPerByte;
+  double const seconds =
+      destination.IsSoftware() ? 0 : static_cast<double>(bytes) * kSecondsPerByte;
   return duration_cast<PollLoop::Duration>(duration<double>(seconds));
 }
 
@@ -88,8 +89,7 @@ void Outgoing::Send(ScheduledMessage const& message) {
   }
   sender->Send({message.bytes.data(), message.bytes.size(), stamp});
   sender->Flush();
-  busyUntil_ =
-      std::max(busyUntil_, DueOf(message)) + WireTime(destination_, message.bytes.size());
+  busyUntil_ = std::max(busyUntil_, DueOf(message)) + WireTime(destination_, message.bytes.size());
 }
 
 Outgoing::Clock::time_point Outgoing::DueOf(ScheduledMessage const& message) const {

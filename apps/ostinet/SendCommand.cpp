@@ -58,7 +58,7 @@ void Send(GlobalOptions const& globals, std::string const& destination,
 CLI::Option* AddRepeatable(CLI::App& command, std::string const& name,
                            std::vector<std::string>& values, std::string const& help) {
   // One value at each place, however often it stands there.
-  return command.add_option(name, values, help)->allow_extra_args(false);
+  return command.add_option(name, values, help)->allow_extra_args(false)->type_name("");
 }
 
 }  // namespace
@@ -68,8 +68,9 @@ void AddSendCommand(CLI::App& app, CommandLine& line) {
   CLI::App* const command = app.add_subcommand("send", "Send messages to a destination");
   command->add_option("DESTINATION", options->destination, "Its name, or an unambiguous part of it")
       ->required();
-  options->wordsOption = command->add_option(
-      "WORDS", options->words, "Bytes in hexadecimal, .syx files, and the verbs below, in any order");
+  options->wordsOption =
+      command->add_option("WORDS", options->words,
+                          "Bytes in hexadecimal, .syx files, and the verbs below, in any order");
   options->timesOption =
       AddRepeatable(*command, "--at", options->times,
                     "+MS: what follows goes out so many milliseconds after the start");

@@ -16,10 +16,10 @@ enum class VerbKind { kSevenBits, kPitchBend, kSysex, kChannel };
 struct Verb {
   std::string_view name;
   VerbKind kind;
-  unsigned char status;    ///< without the channel
+  unsigned char status;  ///< without the channel
   size_t minNumbers;
-  size_t maxNumbers;       ///< what is left out takes `defaultNumber`
-  bool firstIsNote;        ///< the first may be a note's name
+  size_t maxNumbers;  ///< what is left out takes `defaultNumber`
+  bool firstIsNote;   ///< the first may be a note's name
   unsigned char defaultNumber;
   std::string_view help;
 };

@@ -110,8 +110,7 @@ void SendWords::FinishVerb() {
   std::vector<std::string> const numbers(verb_.begin() + 1, verb_.end());
   verb_.clear();
   if (numbers.size() < verb.minNumbers) {
-    throw UsageError("\"" + std::string(verb.name) + "\" needs " +
-                     std::to_string(verb.minNumbers) +
+    throw UsageError("\"" + std::string(verb.name) + "\" needs " + std::to_string(verb.minNumbers) +
                      (verb.minNumbers == 1 ? " number behind it" : " numbers behind it"));
   }
   if (verb.kind == VerbKind::kChannel) {

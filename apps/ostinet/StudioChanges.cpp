@@ -22,18 +22,23 @@ struct Item {
 };
 
 Item ItemOf(EndpointView const& endpoint) {
-  Item item{endpoint.key,    endpoint.isSource ? "source" : "destination",
-            endpoint.name,   endpoint.uniqueID,
-            endpoint.online, {},
+  Item item{endpoint.key,      endpoint.isSource ? "source" : "destination",
+            endpoint.name,     endpoint.uniqueID,
+            endpoint.online,   {},
             endpoint.connected};
   int const interfaceFact = endpoint.isInterface ? int{*endpoint.isInterface} : -1;
   item.otherFacts = std::to_string(endpoint.channels) + "/" +
-                    std::to_string(endpoint.scheduleAheadMuSec) + "/" + std::to_string(interfaceFact);
+                    std::to_string(endpoint.scheduleAheadMuSec) + "/" +
+                    std::to_string(interfaceFact);
   return item;
 }
 
 Item ItemOf(DeviceView const& device) {
-  return {device.key, "device", device.name, device.uniqueID, device.online,
+  return {device.key,
+          "device",
+          device.name,
+          device.uniqueID,
+          device.online,
           device.manufacturer + "/" + device.model + "/" + std::to_string(device.entities.size()),
           {}};
 }

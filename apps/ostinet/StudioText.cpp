@@ -12,8 +12,10 @@ void AddWord(std::string& line, std::string const& word) {
 
 std::string EndpointFacts(EndpointView const& endpoint) {
   std::string facts = endpoint.online ? "online" : "offline";
-  if (endpoint.isInterface.has_value() && !endpoint.software) {
-    AddWord(facts, *endpoint.isInterface ? "interface" : "instrument");
+  if (endpoint.isInterface.value_or(false)) {
+    AddWord(facts, "interface");
+  } else if (endpoint.isInterface && !endpoint.direct && !endpoint.software) {
+    AddWord(facts, "instrument");  // Of a port it would only say that nothing hangs on it.
   }
   if (endpoint.software) {
     AddWord(facts, endpoint.internalSoftware ? "internal software" : "software");

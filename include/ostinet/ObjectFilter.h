@@ -24,8 +24,7 @@ class ObjectFilter {
   /// Always true.
   ObjectFilter() = default;
   /// Always `constant`. A template, so that no function is ever taken for a constant.
-  template <class Bool,
-            typename std::enable_if<std::is_same<Bool, bool>::value, int>::type = 0>
+  template <class Bool, typename std::enable_if<std::is_same<Bool, bool>::value, int>::type = 0>
   explicit ObjectFilter(Bool constant) : constant_(constant) {}
   ObjectFilter(boost::function<bool(T const&)> const& predicate)
       : nodes_(1, Node{kPredicate, false, predicate}) {}

@@ -112,10 +112,10 @@ class OSTINET_EXPORT Setup : private Noncopyable<Setup> {
  public:
   enum SignInResult : int {
     kSignInOK = 0,
-    kSignInAlreadySignedIn = 2,      ///< nothing was changed
-    kSignInPlatformError = 10,       ///< the MIDI system did not start; sign-in can be tried anew
-    kSignInNoMasterClock = 12,       ///< no clock to stamp with; signed in, but with no lists
-    kSignInCoarseMasterClock = 13    ///< a clock coarser than 1 ms; signed in, but with no lists
+    kSignInAlreadySignedIn = 2,    ///< nothing was changed
+    kSignInPlatformError = 10,     ///< the MIDI system did not start; sign-in can be tried anew
+    kSignInNoMasterClock = 12,     ///< no clock to stamp with; signed in, but with no lists
+    kSignInCoarseMasterClock = 13  ///< a clock coarser than 1 ms; signed in, but with no lists
   };
   /// Which end of a virtual pair hosts see in the public lists; the other end is private.
   enum SrcOrDest : int { kSourceEnd = 0, kDestinationEnd = 1, kNeitherEnd = 2 };
@@ -193,8 +193,8 @@ class OSTINET_EXPORT Setup : private Noncopyable<Setup> {
                                                        SrcOrDest destination);
   /// The same with name and unique ID of a reference to an endpoint; two null handles for any
   /// other reference.
-  std::pair<Source, Destination> CreateVirtualEndpoint(MatchData const& reference,
-                                                       SrcOrDest source, SrcOrDest destination);
+  std::pair<Source, Destination> CreateVirtualEndpoint(MatchData const& reference, SrcOrDest source,
+                                                       SrcOrDest destination);
   /// Deletes both ends of a virtual pair.
   void DeleteVirtualEndpoint(Endpoint const& endpoint);
   /// Forgets a port that is not there any more.

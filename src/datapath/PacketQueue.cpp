@@ -14,6 +14,7 @@
 #include "datapath/PacketQueue.h"
 
 #include <cstring>
+#include <new>
 #include <utility>
 
 #include "datapath/PacketNode.h"
@@ -31,30 +32,18 @@ PacketSegment* SegmentOf(std::uintptr_t tail) {
 // Of a tail with a segment: 1 to kNodes.
 std::size_t ReservedOf(std::uintptr_t tail) { return (tail & kReservedMask) + 1; }
 
-constexpr std::size_t kShortMessageBytes = 3;
-
-// Releases the node at the end of a scope.
-class NodeReleaser {
+// The node in a place, which it leaves at the end of a scope.
+class TakenNode {
  public:
-  explicit NodeReleaser(PacketNode& node) : node_(node) {}
-  ~NodeReleaser() { node_.Release(); }
-  NodeReleaser(NodeReleaser const&) = delete;
-  NodeReleaser& operator=(NodeReleaser const&) = delete;
+  TakenNode(PacketSegment& segment, std::size_t index) : node_(segment.Node(index)) {}
+  ~TakenNode() { node_.~PacketNode(); }
+  TakenNode(TakenNode const&) = delete;
+  TakenNode& operator=(TakenNode const&) = delete;
+  DataPacket const& View() const { return node_.View(); }
 
  private:
   PacketNode& node_;
 };
-
-void Deliver(PacketNode& node, Receiver* target, bool filtered, Source const& source) {
-  NodeReleaser const releaser(node);
-  if (node.sysex.get() != nullptr) {
-    node.packet.data = node.sysex->begin();
-    node.packet.length = node.sysex->Size();
-  }
-  if (target != nullptr && (!filtered || target->WantsPacket(node.packet, source))) {
-    target->HandlePacket(node.packet, source);
-  }
-}
 
 }  // namespace
 
@@ -76,43 +65,40 @@ class PacketQueue::DrainScope {
 };
 
 PacketQueue::~PacketQueue() {
-  // Without a receiver, a drain releases what has arrived.
-  Drain(nullptr, nullptr, Source(), false);
-  PacketSegment* segment = current_;
-  while (segment != nullptr) {
-    PacketSegment::Free(std::exchange(segment, segment->next.load(std::memory_order_acquire)));
+  CountReserved();
+  while (current_ != nullptr && FindArrived()) {
+    TakenNode const node(*current_, taken_++);
+  }
+  FreeRetired();
+  if (current_ != nullptr) {
+    PacketSegment::Free(current_);
   }
 }
 
 void PacketQueue::Enqueue(DataPacket const& packet) {
-  // What may throw comes first: a node that is reserved must arrive.
   auto const length = static_cast<std::size_t>(packet.data != nullptr ? packet.length : 0);
-  std::unique_ptr<unsigned char[]> heapBytes;
-  if (length > PacketNode::kInlineBytes) {
-    heapBytes.reset(new unsigned char[length]);
+  if (length <= PacketNode::kInlineBytes) {
+    Put(packet.stamp, packet.data, length);
+    return;
   }
-  PacketNode& node = ReserveNode();
-  unsigned char* const bytes = heapBytes ? heapBytes.get() : node.inlineBytes;
-  if (length == kShortMessageBytes) {
-    std::memcpy(bytes, packet.data, kShortMessageBytes);  // most packets, without a call
-  } else if (length > 0) {
-    std::memcpy(bytes, packet.data, length);
-  }
-  node.packet = {bytes, length, packet.stamp};
-  if (heapBytes) {
-    node.heapBytes = std::move(heapBytes);
-  }
-  node.arrived.store(true, std::memory_order_release);
+  std::unique_ptr<unsigned char[]> bytes(new unsigned char[length]);
+  std::memcpy(bytes.get(), packet.data, length);
+  Put(packet.stamp, std::move(bytes), length);
 }
 
 void PacketQueue::Enqueue(TimeStamp const& stamp, RCPtrMT<SysexImpl> const& sysex) {
-  PacketNode& node = ReserveNode();
-  node.packet.stamp = stamp;
-  node.sysex = sysex;
-  node.arrived.store(true, std::memory_order_release);
+  Put(stamp, sysex.get());
 }
 
-PacketNode& PacketQueue::ReserveNode() {
+// Making the node must not throw: a place that is reserved must be filled.
+template <class... Args>
+void PacketQueue::Put(Args&&... args) {
+  Reservation const place = Reserve();
+  new (place.segment->Place(place.index)) PacketNode(std::forward<Args>(args)...);
+  place.segment->arrived[place.index].store(true, std::memory_order_release);
+}
+
+PacketQueue::Reservation PacketQueue::Reserve() {
   // Acquire: the segment was made before the tail named it. The exchanges release, so that they
   // hand that on.
   std::uintptr_t tail = tail_.load(std::memory_order_acquire);
@@ -121,7 +107,7 @@ PacketNode& PacketQueue::ReserveNode() {
     if (segment != nullptr && ReservedOf(tail) < PacketSegment::kNodes) {
       if (tail_.compare_exchange_weak(tail, tail + 1, std::memory_order_acq_rel,
                                       std::memory_order_acquire)) {
-        return segment->nodes[ReservedOf(tail)];
+        return {segment, ReservedOf(tail)};
       }
       continue;
     }
@@ -129,7 +115,7 @@ PacketNode& PacketQueue::ReserveNode() {
     if (tail_.compare_exchange_strong(tail, reinterpret_cast<std::uintptr_t>(fresh),
                                       std::memory_order_acq_rel, std::memory_order_acquire)) {
       (segment != nullptr ? segment->next : firstSegment_).store(fresh, std::memory_order_release);
-      return fresh->nodes[0];
+      return {fresh, 0};
     }
     PacketSegment::Free(fresh);  // another producer was quicker
   }
@@ -147,15 +133,15 @@ void PacketQueue::Drain(Receiver* setupReceiver, Receiver* directReceiver, Sourc
   DrainScope const scope(*this);
   // A total, and not a count, as the receiver may drain from within.
   unsigned long long const goal = totalTaken_ + CountReserved();
-  while (totalTaken_ < goal) {
-    PacketNode* const node = FirstNode();
-    if (node == nullptr) {
-      return;  // its producer is still filling it
-    }
+  // A node that is reserved but not complete ends the drain.
+  while (totalTaken_ < goal && FindArrived()) {
     // Taken before it is delivered, so that the receiver may throw, or drain from within.
-    ++taken_;
+    TakenNode const node(*current_, taken_++);
     ++totalTaken_;
-    Deliver(*node, target, filtered, source);
+    DataPacket const& packet = node.View();
+    if (target != nullptr && (!filtered || target->WantsPacket(packet, source))) {
+      target->HandlePacket(packet, source);
+    }
   }
 }
 
@@ -179,19 +165,18 @@ unsigned long long PacketQueue::CountReserved() {
   return count;  // the last link is about to be made
 }
 
-// The oldest packet that was not taken, if it has arrived.
-PacketNode* PacketQueue::FirstNode() {
+// Moves to the oldest node that was not taken, in a segment that is there; whether it has arrived.
+bool PacketQueue::FindArrived() {
   if (taken_ == PacketSegment::kNodes) {
     PacketSegment* const next = current_->next.load(std::memory_order_acquire);
     if (next == nullptr) {
-      return nullptr;
+      return false;
     }
     current_->next.store(retired_, std::memory_order_relaxed);  // ours alone from here on
     retired_ = std::exchange(current_, next);
     taken_ = 0;
   }
-  PacketNode& node = current_->nodes[taken_];
-  return node.arrived.load(std::memory_order_acquire) ? &node : nullptr;
+  return current_->arrived[taken_].load(std::memory_order_acquire);
 }
 
 void PacketQueue::FreeRetired() {

@@ -4,7 +4,6 @@
 #include <atomic>
 #include <cstddef>
 #include <cstdint>
-#include <memory>
 
 #include "ostinet/Endpoint.h"
 #include "ostinet/SysexRef.h"
@@ -12,7 +11,6 @@
 
 namespace Ostinet::Impl {
 
-struct PacketNode;
 struct PacketSegment;
 
 /// Input on its way from the system's threads to the host's polling thread, in order of arrival.
@@ -49,9 +47,16 @@ class PacketQueue {
  private:
   class DrainScope;
 
-  PacketNode& ReserveNode();
+  struct Reservation {
+    PacketSegment* segment;
+    std::size_t index;
+  };
+
+  template <class... Args>
+  void Put(Args&&... args);
+  Reservation Reserve();
   unsigned long long CountReserved();
-  PacketNode* FirstNode();
+  bool FindArrived();
   void FreeRetired();
 
   // The producers' end: where the last segment is, and in the low bits how many of its nodes are

@@ -18,8 +18,8 @@ struct SpecialEntity {
 };
 
 constexpr SpecialEntity kSpecialEntities[] = {
-    {Device::kDeviceCommonEntity, 3, 0},  {Device::kDeviceCommonEntity, 5, 0},
-    {Device::kDeviceCommonEntity, 6, 0},  {Device::kSecondCommonEntity, 3, 17},
+    {Device::kDeviceCommonEntity, 3, 0}, {Device::kDeviceCommonEntity, 5, 0},
+    {Device::kDeviceCommonEntity, 6, 0}, {Device::kSecondCommonEntity, 3, 17},
     {Device::kThirdCommonEntity, 3, 99},
 };
 

@@ -14,8 +14,7 @@ namespace {
 
 bool Supports(Endpoint const& handle, Impl::KeyPair const& keys, bool fallback) {
   Impl::EndpointImpl const* const impl = ImplOf(handle);
-  return impl != nullptr &&
-         impl->GetInt(keys.For(impl->IsDestination()), fallback ? 1 : 0) != 0;
+  return impl != nullptr && impl->GetInt(keys.For(impl->IsDestination()), fallback ? 1 : 0) != 0;
 }
 
 }  // namespace

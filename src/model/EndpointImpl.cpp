@@ -156,8 +156,7 @@ boost::optional<bool> EndpointImpl::IsInterface() const {
   if (!connected_.empty()) {
     return true;
   }
-  DeviceImpl const* const device =
-      kind_.entity != nullptr ? kind_.entity->GetDevice() : nullptr;
+  DeviceImpl const* const device = kind_.entity != nullptr ? kind_.entity->GetDevice() : nullptr;
   if (device != nullptr && device->GetName().starts_with("INTERFACE")) {
     return true;
   }

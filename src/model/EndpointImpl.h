@@ -86,7 +86,7 @@ class EndpointImpl : public DeviceObjectImpl {
  private:
   /// Where the endpoint stands among the endpoints of its direction in its entity.
   struct Place {
-    int index = -1;          // -1: in no entity
+    int index = -1;  // -1: in no entity
     bool hasSiblings = false;
   };
   Place FindPlace() const;

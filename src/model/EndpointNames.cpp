@@ -55,8 +55,7 @@ UString const& EndpointImpl::NameToShow() const {
 
 UString EndpointImpl::BuildName() const {
   UString name;
-  DeviceImpl const* const device =
-      kind_.entity != nullptr ? kind_.entity->GetDevice() : nullptr;
+  DeviceImpl const* const device = kind_.entity != nullptr ? kind_.entity->GetDevice() : nullptr;
   if (device != nullptr && device->Peer()->GetString(Keys::kName, name)) {
     Place const place = FindPlace();
     bool const hasManyEntities = device->GetEntities().size() > 1;

@@ -18,6 +18,18 @@ void Assign(Value const& value, Value& out) {
 
 void Assign(PropertyPath const& value, UString& out) { out = value.path; }
 
+void CountIn(PropertyValue const& uniqueID) {
+  if (int const* const id = boost::get<int>(&uniqueID)) {
+    NoteStoredUniqueID(*id);
+  }
+}
+
+void CountOut(PropertyValue const& uniqueID) {
+  if (int const* const id = boost::get<int>(&uniqueID)) {
+    ForgetStoredUniqueID(*id);
+  }
+}
+
 }  // namespace
 
 SelfStorageImplImpl::~SelfStorageImplImpl() { Erase(Keys::kUniqueID); }
@@ -55,9 +67,7 @@ bool SelfStorageImplImpl::GetString(UString const& key, UString& out) const {
   return Read<UString>(key, out);
 }
 
-bool SelfStorageImplImpl::GetInt(UString const& key, int& out) const {
-  return Read<int>(key, out);
-}
+bool SelfStorageImplImpl::GetInt(UString const& key, int& out) const { return Read<int>(key, out); }
 
 bool SelfStorageImplImpl::SetFile(UString const& key, UString const& path) {
   return Write(key, PropertyPath{path});
@@ -86,8 +96,9 @@ bool SelfStorageImplImpl::Write(UString const& key, PropertyValue value) {
 }
 
 void SelfStorageImplImpl::RemoveProperty(UString const& key) {
-  Erase(key);
-  PropChangedInternal(key);
+  UString const removed = key;  // which may be the store's own
+  Erase(removed);
+  PropChangedInternal(removed);
 }
 
 void SelfStorageImplImpl::TouchProperty(UString const&) {}
@@ -116,13 +127,14 @@ void SelfStorageImplImpl::CopyProperty(SelfStorageImplImpl const& other, UString
 }
 
 void SelfStorageImplImpl::Put(UString const& key, PropertyValue value) {
-  bool const isID = key == Keys::kUniqueID;
-  if (isID) {
-    Erase(key);
+  auto const [place, isNew] = store_.try_emplace(key);
+  bool const isID = place->first == Keys::kUniqueID;
+  if (isID && !isNew) {
+    CountOut(place->second);
   }
-  PropertyValue& stored = store_[key] = std::move(value);
-  if (int const* const id = isID ? boost::get<int>(&stored) : nullptr) {
-    NoteStoredUniqueID(*id);
+  place->second = std::move(value);
+  if (isID) {
+    CountIn(place->second);
   }
 }
 
@@ -131,10 +143,8 @@ void SelfStorageImplImpl::Erase(UString const& key) {
   if (place == store_.end()) {
     return;
   }
-  if (key == Keys::kUniqueID) {
-    if (int const* const id = boost::get<int>(&place->second)) {
-      ForgetStoredUniqueID(*id);
-    }
+  if (place->first == Keys::kUniqueID) {
+    CountOut(place->second);
   }
   store_.erase(place);
 }

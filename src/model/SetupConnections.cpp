@@ -80,8 +80,8 @@ void ConnectAll(std::vector<RCPtrMT<T>> const& list) {
 
 template <class T, class Used>
 void ConnectOne(std::vector<RCPtrMT<T>> const& list, T& port, Used& used) {
-  Round<T>(list).Connect(
-      port, [&](RCPtrMT<T> const& endpoint) { return used.insert(endpoint).second; });
+  Round<T>(list).Connect(port,
+                         [&](RCPtrMT<T> const& endpoint) { return used.insert(endpoint).second; });
 }
 
 // What an imported endpoint says of the port that it hung on.
@@ -118,14 +118,13 @@ void Setup::UpdateConnections() {
 
 void Setup::UpdateSourceConnections(
     RCPtrMT<Impl::EndpointImpl> const& source,
-    sorted_vector_set<RCPtrMT<Impl::EndpointImpl>, std::less<RCPtrMT<Impl::EndpointImpl> > >&
-        used) {
+    sorted_vector_set<RCPtrMT<Impl::EndpointImpl>, std::less<RCPtrMT<Impl::EndpointImpl>>>& used) {
   ConnectOne(GetStudio().sources, *source, used);
 }
 
 void Setup::UpdateDestConnections(
     RCPtrMT<Impl::DestinationImpl> const& destination,
-    sorted_vector_set<RCPtrMT<Impl::DestinationImpl>, std::less<RCPtrMT<Impl::DestinationImpl> > >&
+    sorted_vector_set<RCPtrMT<Impl::DestinationImpl>, std::less<RCPtrMT<Impl::DestinationImpl>>>&
         used) {
   ConnectOne(GetStudio().destinations, *destination, used);
 }
@@ -136,8 +135,8 @@ void Setup::HandleImportConnection(XMLLib::Parser& parser, Impl::ImplImpl& peer,
   if (!wanted.Read(parser) || !peer.GetInt(Keys::kUniqueID, id)) {
     return;
   }
-  Impl::EndpointImpl* const port = isSource ? FindPort(GetStudio().sources, wanted)
-                                            : FindPort(GetStudio().destinations, wanted);
+  Impl::EndpointImpl* const port =
+      isSource ? FindPort(GetStudio().sources, wanted) : FindPort(GetStudio().destinations, wanted);
   if (port == nullptr) {
     return;
   }

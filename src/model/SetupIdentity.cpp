@@ -19,8 +19,7 @@ namespace {
 template <class Look>
 bool AnyObject(Impl::Studio const& studio, Look const& look) {
   auto const inList = [&](auto const& list) {
-    return std::any_of(list.begin(), list.end(),
-                       [&](auto const& object) { return look(*object); });
+    return std::any_of(list.begin(), list.end(), [&](auto const& object) { return look(*object); });
   };
   return inList(studio.devices) || inList(studio.entities) || inList(studio.sources) ||
          inList(studio.destinations) || inList(studio.privateSources) ||
@@ -40,10 +39,9 @@ UString Setup::MakeUniqueDevName(UString const& name) {
 
 bool Setup::HaveDeviceWithName(UString const& name) const {
   auto const& devices = GetStudio().devices;
-  return std::any_of(devices.begin(), devices.end(),
-                     [&](RCPtrMT<Impl::DeviceImpl> const& device) {
-                       return device->GetName().equal(name, UString::kLooselyEqual);
-                     });
+  return std::any_of(devices.begin(), devices.end(), [&](RCPtrMT<Impl::DeviceImpl> const& device) {
+    return device->GetName().equal(name, UString::kLooselyEqual);
+  });
 }
 
 bool Setup::UniqueIDInUse(int id) const {

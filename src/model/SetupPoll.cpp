@@ -79,8 +79,7 @@ void Setup::Suspend() {}
 void Setup::Resume() {}
 
 void Setup::SaveEditedDestBanks() {
-  for (Destinations const* list :
-       {&GetStudio().destinations, &GetStudio().privateDestinations}) {
+  for (Destinations const* list : {&GetStudio().destinations, &GetStudio().privateDestinations}) {
     Destinations const destinations = *list;
     for (RCPtrMT<Impl::DestinationImpl> const& destination : destinations) {
       if (Impl::DestinationNames* const names = destination->GetNames()) {

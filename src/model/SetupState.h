@@ -13,7 +13,7 @@ namespace Ostinet {
 /// What Setup holds.
 struct Setup::State {
   UString signInName;
-  Receiver* receiver = nullptr;      // the host's; null while signed out
+  Receiver* receiver = nullptr;       // the host's; null while signed out
   SetupListener* listener = nullptr;  // the host's
   PrefsHandler* prefs = nullptr;      // the host's
   int changesPollCount = 0;           // rounds since edited banks were last saved

@@ -38,7 +38,7 @@ struct PortOpener : boost::static_visitor<void> {
   template <class Port, class Info>
   void OpenLegacy(Info const& info) const {
     auto port = std::make_unique<Port>(setup, session);
-    port->Open(info.device);
+    port->Open(info.device, info.caps);
     peer.Attach(WinMIDIPort::kLegacy, std::move(port));
   }
   void operator()(DMusInput const& info) const { OpenDMus<WinDMusMIDIInPort>(info); }

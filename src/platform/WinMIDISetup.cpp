@@ -151,6 +151,11 @@ void WinMIDISetup::DevicesChanged() {
   });
 }
 
+bool WinMIDISetup::HasListedPorts() const {
+  MutexHolder const lock(sessionMutex_);
+  return pollFuture_ != nullptr && pollFuture_->IsComplete();
+}
+
 std::optional<PortList> WinMIDISetup::CollectPorts() {
   std::shared_ptr<VantorFuture<PortList>> future;
   {

@@ -36,6 +36,9 @@ class WinMIDISetup : public Setup, public WinMIDIDevicesListener {
   /// Puts a source on the list that ProcessInput walks, once.
   void AddActiveSource(RCPtrMT<EndpointImpl> const& source);
 
+  /// Whether a list of ports waits for the next PollSetupChanges. [any thread]
+  bool HasListedPorts() const;
+
   bool IsSignedIn() override;
   void ProcessInput() override;
   void PropChanged(DeviceObjectImpl* object, UString const& key) override;

@@ -49,10 +49,9 @@ TEST(CompareFlags, FoldCaseInEveryScript) {
 }
 
 TEST(CompareFlags, PeopleSortNumbersAsNumbers) {
-  auto const flags = UString::CompareFlags(32);
   std::vector<UString> models{"JX-10", "jx-8P", "JX-3P", "jx-100", "JX", "JX-08"};
   std::sort(models.begin(), models.end(),
-            [flags](UString const& a, UString const& b) { return a.less(b, flags); });
+            [](UString const& a, UString const& b) { return a.less(b, UString::kForPeople); });
   EXPECT_EQ(models, (std::vector<UString>{"JX", "JX-3P", "JX-08", "jx-8P", "JX-10", "jx-100"}));
 }
 

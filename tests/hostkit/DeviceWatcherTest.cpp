@@ -1,12 +1,11 @@
 // SPDX-License-Identifier: MIT
-#include "ostinet/hostkit/DeviceWatcher.h"
-
 #include <gtest/gtest.h>
 
 #include <atomic>
 #include <stdexcept>
 
 #include "ostinet/SimulatedMIDI.h"
+#include "ostinet/hostkit/DeviceWatcher.h"
 
 namespace Ostinet {
 namespace {

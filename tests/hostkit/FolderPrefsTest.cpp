@@ -1,10 +1,10 @@
 // SPDX-License-Identifier: MIT
-#include "ostinet/hostkit/FolderPrefs.h"
-
 #include <gtest/gtest.h>
 
 #include <filesystem>
 #include <fstream>
+
+#include "ostinet/hostkit/FolderPrefs.h"
 
 namespace Ostinet {
 namespace {
@@ -33,10 +33,10 @@ class Prefs : public testing::Test {
     return block;
   }
 
-  fs::path path_ = fs::absolute(fs::path(testing::TempDir())) /
-                   (std::string("prefs-") +
-                    testing::UnitTest::GetInstance()->current_test_info()->name()) /
-                   "settings";
+  fs::path path_ =
+      fs::absolute(fs::path(testing::TempDir())) /
+      (std::string("prefs-") + testing::UnitTest::GetInstance()->current_test_info()->name()) /
+      "settings";
 };
 
 TEST_F(Prefs, KeepBlocksBetweenTwoLives) {

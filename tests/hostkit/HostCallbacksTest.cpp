@@ -1,9 +1,8 @@
 // SPDX-License-Identifier: MIT
-#include "ostinet/hostkit/HostCallbacks.h"
-
 #include <gtest/gtest.h>
 
 #include "ostinet/SimulatedMIDI.h"
+#include "ostinet/hostkit/HostCallbacks.h"
 
 namespace Ostinet {
 namespace {

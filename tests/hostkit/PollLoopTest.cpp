@@ -1,6 +1,4 @@
 // SPDX-License-Identifier: MIT
-#include "ostinet/hostkit/PollLoop.h"
-
 #include <gtest/gtest.h>
 
 #include <atomic>
@@ -8,6 +6,8 @@
 #include <stdexcept>
 #include <thread>
 #include <vector>
+
+#include "ostinet/hostkit/PollLoop.h"
 
 namespace Ostinet {
 namespace {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
-#include "PollSchedule.h"
-
 #include <gtest/gtest.h>
+
+#include "PollSchedule.h"
 
 namespace Ostinet {
 namespace {
@@ -19,8 +19,8 @@ class Schedule : public testing::Test {
 
   PollSchedule::Time At(int ms) const { return PollSchedule::Time() + milliseconds(ms); }
 
-  PollSchedule schedule_{{milliseconds(2), milliseconds(1000), milliseconds(2000),
-                          milliseconds(20), milliseconds(100)},
+  PollSchedule schedule_{{milliseconds(2), milliseconds(1000), milliseconds(2000), milliseconds(20),
+                          milliseconds(100)},
                          PollSchedule::Time()};
 };
 

@@ -47,31 +47,31 @@ TEST_P(DeviceObjectFlag, IsStoredAsANumberUnderItsKey) {
 using D = DeviceObject;
 INSTANTIATE_TEST_SUITE_P(
     All, DeviceObjectFlag,
-    ::testing::Values(
-        Flag{"is drum machine", false, &D::IsADrumMachine, &D::SetIsADrumMachine},
-        Flag{"is mixer", false, &D::IsAMixer, &D::SetIsAMixer},
-        Flag{"is sampler", false, &D::IsASampler, &D::SetIsASampler},
-        Flag{"is effect unit", false, &D::IsAnEffectsUnit, &D::SetIsAnEffectsUnit},
-        Flag{"receives bank select MSB", false, &D::ReceivesBankSelect0,
-             &D::SetReceivesBankSelect0},
-        Flag{"receives bank select LSB", false, &D::ReceivesBankSelect32,
-             &D::SetReceivesBankSelect32},
-        Flag{"receives clock", false, &D::ReceivesClock, &D::SetReceivesClock},
-        Flag{"receives MTC", false, &D::ReceivesMTC, &D::SetReceivesMTC},
-        Flag{"receives notes", true, &D::ReceivesNotes, &D::SetReceivesNotes},
-        Flag{"receives program changes", true, &D::ReceivesProgramChange,
-             &D::SetReceivesProgramChange},
-        Flag{"transmits bank select MSB", false, &D::TransmitsBankSelect0,
-             &D::SetTransmitsBankSelect0},
-        Flag{"transmits bank select LSB", false, &D::TransmitsBankSelect32,
-             &D::SetTransmitsBankSelect32},
-        Flag{"transmits clock", false, &D::TransmitsClock, &D::SetTransmitsClock},
-        Flag{"transmits MTC", false, &D::TransmitsMTC, &D::SetTransmitsMTC},
-        Flag{"transmits notes", true, &D::TransmitsNotes, &D::SetTransmitsNotes},
-        Flag{"transmits program changes", true, &D::TransmitsProgramChange,
-             &D::SetTransmitsProgramChange},
-        Flag{"supports General MIDI", false, &D::SupportsGeneralMIDI, &D::SetSupportsGeneralMIDI},
-        Flag{"supports MMC", false, &D::SupportsMMC, &D::SetSupportsMMC}));
+    ::testing::Values(Flag{"is drum machine", false, &D::IsADrumMachine, &D::SetIsADrumMachine},
+                      Flag{"is mixer", false, &D::IsAMixer, &D::SetIsAMixer},
+                      Flag{"is sampler", false, &D::IsASampler, &D::SetIsASampler},
+                      Flag{"is effect unit", false, &D::IsAnEffectsUnit, &D::SetIsAnEffectsUnit},
+                      Flag{"receives bank select MSB", false, &D::ReceivesBankSelect0,
+                           &D::SetReceivesBankSelect0},
+                      Flag{"receives bank select LSB", false, &D::ReceivesBankSelect32,
+                           &D::SetReceivesBankSelect32},
+                      Flag{"receives clock", false, &D::ReceivesClock, &D::SetReceivesClock},
+                      Flag{"receives MTC", false, &D::ReceivesMTC, &D::SetReceivesMTC},
+                      Flag{"receives notes", true, &D::ReceivesNotes, &D::SetReceivesNotes},
+                      Flag{"receives program changes", true, &D::ReceivesProgramChange,
+                           &D::SetReceivesProgramChange},
+                      Flag{"transmits bank select MSB", false, &D::TransmitsBankSelect0,
+                           &D::SetTransmitsBankSelect0},
+                      Flag{"transmits bank select LSB", false, &D::TransmitsBankSelect32,
+                           &D::SetTransmitsBankSelect32},
+                      Flag{"transmits clock", false, &D::TransmitsClock, &D::SetTransmitsClock},
+                      Flag{"transmits MTC", false, &D::TransmitsMTC, &D::SetTransmitsMTC},
+                      Flag{"transmits notes", true, &D::TransmitsNotes, &D::SetTransmitsNotes},
+                      Flag{"transmits program changes", true, &D::TransmitsProgramChange,
+                           &D::SetTransmitsProgramChange},
+                      Flag{"supports General MIDI", false, &D::SupportsGeneralMIDI,
+                           &D::SetSupportsGeneralMIDI},
+                      Flag{"supports MMC", false, &D::SupportsMMC, &D::SetSupportsMMC}));
 
 TEST_F(DeviceObjectTest, TheMonitorFlagIsStoredUnderItsKey) {
   EXPECT_FALSE(device.IsOpenInMIDIMonitor());
@@ -156,12 +156,9 @@ TEST_F(DeviceObjectTest, TheModelInfoFollowsFromTheDeviceType) {
   struct {
     int type;
     unsigned char bytes[7];
-  } const kCases[] = {{0, {255, 255, 255, 255, 255, 255, 255}},
-                      {3, {0, 0, 0x33, 0, 7, 0x10, 0}},
-                      {4, {255, 255, 255, 255, 255, 255, 255}},
-                      {5, {0, 0, 0x33, 0, 7, 0x11, 0}},
-                      {6, {0, 0, 0x33, 0, 7, 0x12, 0}},
-                      {7, {0, 0, 0x33, 1, 0, 1, 0}}};
+  } const kCases[] = {{0, {255, 255, 255, 255, 255, 255, 255}}, {3, {0, 0, 0x33, 0, 7, 0x10, 0}},
+                      {4, {255, 255, 255, 255, 255, 255, 255}}, {5, {0, 0, 0x33, 0, 7, 0x11, 0}},
+                      {6, {0, 0, 0x33, 0, 7, 0x12, 0}},         {7, {0, 0, 0x33, 1, 0, 1, 0}}};
   EXPECT_TRUE(device.GetModelInfo() == ModelInfo());
   for (auto const& one : kCases) {
     TestSetup::SetInt(device, "com_vantor_DeviceType", one.type);
@@ -191,15 +188,36 @@ TEST_F(DeviceObjectTest, IsOnlineWhileItExistsAndIsNotMarkedOffline) {
 }
 
 TEST(PropertyKeys, AreAllDifferent) {
-  std::set<UString> const keys = {
-      Keys::kName, Keys::kManufacturer, Keys::kModel, Keys::kUniqueID, Keys::kConnUniqueID,
-      Keys::kSlotDescriptor, Keys::kDeviceType, Keys::kPortNumber, Keys::kImage, Keys::kDeviceID,
-      Keys::kScheduleAheadMuSec, Keys::kOffline, Keys::kWhichAPI, Keys::kEmbedded,
-      Keys::kBroadcast, Keys::kDriver, Keys::kReceiveChannels, Keys::kTransmitChannels,
-      Keys::kMaxReceiveChannels, Keys::kMaxTransmitChannels, Keys::kSingleRealtimeEntity,
-      Keys::kCanRoute, Keys::kPanDisruptsStereo, Keys::kNameConfiguration,
-      Keys::kSavedManufacturer, Keys::kSavedModel, Keys::kSavedMasterNameFile,
-      Keys::kDriverVersion, Keys::kMaxSysExSpeed, Keys::kPrivate};
+  std::set<UString> const keys = {Keys::kName,
+                                  Keys::kManufacturer,
+                                  Keys::kModel,
+                                  Keys::kUniqueID,
+                                  Keys::kConnUniqueID,
+                                  Keys::kSlotDescriptor,
+                                  Keys::kDeviceType,
+                                  Keys::kPortNumber,
+                                  Keys::kImage,
+                                  Keys::kDeviceID,
+                                  Keys::kScheduleAheadMuSec,
+                                  Keys::kOffline,
+                                  Keys::kWhichAPI,
+                                  Keys::kEmbedded,
+                                  Keys::kBroadcast,
+                                  Keys::kDriver,
+                                  Keys::kReceiveChannels,
+                                  Keys::kTransmitChannels,
+                                  Keys::kMaxReceiveChannels,
+                                  Keys::kMaxTransmitChannels,
+                                  Keys::kSingleRealtimeEntity,
+                                  Keys::kCanRoute,
+                                  Keys::kPanDisruptsStereo,
+                                  Keys::kNameConfiguration,
+                                  Keys::kSavedManufacturer,
+                                  Keys::kSavedModel,
+                                  Keys::kSavedMasterNameFile,
+                                  Keys::kDriverVersion,
+                                  Keys::kMaxSysExSpeed,
+                                  Keys::kPrivate};
   EXPECT_EQ(keys.size(), 30U);
   EXPECT_EQ(std::set<UString>(Keys::kChannelNames.begin(), Keys::kChannelNames.end()).size(), 16U);
   EXPECT_EQ(Keys::kChannelNames[15], UString("com_vantor_ChannelName15"));

@@ -1,4 +1,5 @@
 // SPDX-License-Identifier: MIT
+#include <boost/optional/optional_io.hpp>
 #include <cstdlib>
 
 #include "model/PropertyKeys.h"
@@ -94,8 +95,7 @@ TEST_F(EndpointTest, AChangeOfNameAndModelTogetherLeavesTheStandaloneFlag) {
 
 TEST_F(EndpointTest, ABarePortAndSoftwareAreNoInterfaces) {
   EXPECT_EQ(setup.MakePort("Port").IsInterface(), boost::optional<bool>(false));
-  Destination const software =
-      setup.MakeDestination("Soft", EndpointKind::Software(false, false));
+  Destination const software = setup.MakeDestination("Soft", EndpointKind::Software(false, false));
   EXPECT_FALSE(software.HasConnections());
   EXPECT_EQ(software.IsInterface(), boost::optional<bool>(false));
 }
@@ -127,8 +127,8 @@ TEST_F(EndpointTest, ChannelsAreTheMaskElseTheCountElseAll) {
   struct {
     int count;
     int mask;
-  } const kCounts[] = {{4, 0x000F},  {0, 0},  {-5, 0}, {1, 1}, {15, 0x7FFF}, {16, 0xFFFF},
-                       {20, 0xFFFF}, {2147483647, 0xFFFF}};
+  } const kCounts[] = {{4, 0x000F},  {0, 0},       {-5, 0},      {1, 1},
+                       {15, 0x7FFF}, {16, 0xFFFF}, {20, 0xFFFF}, {2147483647, 0xFFFF}};
   for (auto const& one : kCounts) {
     TestSetup::SetInt(port, "max receive channels", one.count);
     EXPECT_EQ(port.GetChannels(), one.mask) << one.count;
@@ -212,7 +212,7 @@ TEST_F(EndpointTest, ALoopIsKnownByItsDriver) {
   EXPECT_FALSE(port.IsLoop());
 }
 
-TEST_F(EndpointTest, BroadcastAndPregenComeFromTheProperyAndThePeer) {
+TEST_F(EndpointTest, BroadcastAndPregenComeFromThePropertyAndThePeer) {
   Destination const port = setup.MakePort("Port");
   EXPECT_FALSE(port.IsBroadcast());
   TestSetup::SetInt(port, "broadcast", 1);
@@ -232,10 +232,9 @@ TEST_F(EndpointTest, TheKindsDifferInTheirFlags) {
   Destination const bare = setup.MakeDestination("B", EndpointKind::Bare(false, false));
   EXPECT_FALSE(bare.IsDirect() || bare.IsSoftware() || bare.IsInternalSoftware() ||
                bare.IsPrivate() || bare.IsVirtual());
-  Source const virtualSource =
-      setup.MakeSource("V", EndpointKind::Virtual(nullptr, false, false));
-  EXPECT_TRUE(virtualSource.IsDirect() && virtualSource.IsSoftware() &&
-              virtualSource.IsVirtual() && !virtualSource.IsInternalSoftware());
+  Source const virtualSource = setup.MakeSource("V", EndpointKind::Virtual(nullptr, false, false));
+  EXPECT_TRUE(virtualSource.IsDirect() && virtualSource.IsSoftware() && virtualSource.IsVirtual() &&
+              !virtualSource.IsInternalSoftware());
   EXPECT_EQ(ImplOf(software)->GetObjectID(), Destination::kObjectID);
   EXPECT_EQ(ImplOf(virtualSource)->GetObjectID(), Source::kObjectID);
 }

@@ -63,6 +63,7 @@ TEST_F(HandleTest, TheLastHandleOfARemovedObjectFreesItAndItsPeer) {
     Device device = setup.MakeDevice("Synth");
     EXPECT_EQ(TestPeer::sAlive, alive + 1);
     setup.DeleteDevice(device);
+    setup.pending.clear();
     EXPECT_EQ(TestPeer::sAlive, alive + 1);
     device = Device();
     EXPECT_EQ(TestPeer::sAlive, alive);
@@ -80,6 +81,7 @@ TEST_F(HandleTest, AssigningAHandleToItselfKeepsItsObject) {
   int const alive = TestPeer::sAlive;
   Device device = setup.MakeDevice("Synth");
   setup.DeleteDevice(device);
+  setup.pending.clear();
   Device const& same = device;
   device = same;
   EXPECT_EQ(TestPeer::sAlive, alive + 1);

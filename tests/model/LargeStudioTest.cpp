@@ -27,9 +27,8 @@ class LargeStudioTest : public StudioTest {
  protected:
   void Make(int count, bool isDirect) {
     for (int i = 0; i < count; ++i) {
-      RCPtrMT<Impl::DestinationImpl> destination(
-          new Impl::DestinationImpl(std::make_unique<CountingPeer>(setup), setup,
-                                    EndpointKind::Bare(isDirect, false)));
+      RCPtrMT<Impl::DestinationImpl> destination(new Impl::DestinationImpl(
+          std::make_unique<CountingPeer>(setup), setup, EndpointKind::Bare(isDirect, false)));
       setup.GetStudio().destinations.push_back(destination);
       setup.MaybeAssignUniqueID(*destination);
     }

@@ -1,8 +1,7 @@
 // SPDX-License-Identifier: MIT
-#include "model/NameFileStore.h"
-
 #include <cstdint>
 
+#include "model/NameFileStore.h"
 #include "support/StudioTest.h"
 
 namespace Ostinet::Testing {

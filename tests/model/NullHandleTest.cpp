@@ -58,13 +58,18 @@ bool FlagsAreFalse() {
   return true;
 }
 
-#define CASE(expression) NullCase{#expression, [] { return expression; }}
+#define CASE(expression)                   \
+  NullCase {                               \
+#expression, [] { return expression; } \
+  }
 // For an operation that gives nothing: it returns, and tells nobody.
 #define QUIET(statement) \
-  NullCase{#statement, [] { \
+  NullCase {             \
+#statement, [] { \
              statement; \
              return DoesNothing(); \
-           }}
+           }       \
+  }
 
 UString const kNone;
 
@@ -75,9 +80,8 @@ INSTANTIATE_TEST_SUITE_P(
         CASE(!DeviceObject().IsOnline()), CASE(DeviceObject().GetName() == kNone),
         CASE(DeviceObject().GetImplPtr() == nullptr), CASE(DeviceObject().GetKey() == 0),
         CASE(DeviceObject().GetRawName() == kNone), QUIET(DeviceObject().SetRawName("x")),
-        CASE(DeviceObject().GetManufacturer() == kNone),
-        QUIET(DeviceObject().SetManufacturer("x")), CASE(DeviceObject().GetModel() == kNone),
-        QUIET(DeviceObject().SetModel("x")),
+        CASE(DeviceObject().GetManufacturer() == kNone), QUIET(DeviceObject().SetManufacturer("x")),
+        CASE(DeviceObject().GetModel() == kNone), QUIET(DeviceObject().SetModel("x")),
         CASE(static_cast<signed char>(DeviceObject().GetSysexDeviceID()) == -1),
         QUIET(DeviceObject().SetSysexDeviceID(3)),
         CASE(DeviceObject().GetAdvanceScheduleMicroseconds() == 0),
@@ -95,39 +99,41 @@ INSTANTIATE_TEST_SUITE_P(
     DeviceAndEntity, NullHandle,
     ::testing::Values(CASE(Device().CountEntities() == 0), CASE(!Device().GetEntity(0).Exists()),
                       CASE(Device().GetSpecialEntity(Device::kRealtimeEntity) == Entity()),
-                      CASE(!Device().IsOpenInMIDIMonitor()), QUIET(Device().OpenInMIDIMonitor(true)),
-                      CASE(Entity().CountSources() == 0), CASE(Entity().GetSource(0) == Source()),
+                      CASE(!Device().IsOpenInMIDIMonitor()),
+                      QUIET(Device().OpenInMIDIMonitor(true)), CASE(Entity().CountSources() == 0),
+                      CASE(Entity().GetSource(0) == Source()),
                       CASE(Entity().CountDestinations() == 0),
                       CASE(Entity().GetDestination(0) == Destination()),
                       CASE(Entity().GetDevice() == Device())));
 
 INSTANTIATE_TEST_SUITE_P(
     Endpoint, NullHandle,
-    ::testing::Values(
-        CASE(Endpoint().GetUniqueID() == 0), CASE(Endpoint().GetEntity() == Entity()),
-        CASE(Endpoint().GetChannelName(0) == kNone), CASE(Endpoint().GetChannels() == 0),
-        CASE(Endpoint().GetEntityAndEndpointName() == kNone),
-        CASE(Endpoint().GetSlotID() == SlotID()), CASE(!Endpoint().HasConnections()),
-        CASE(!Endpoint().IsDeviceCommon()), CASE(!Endpoint().IsInterface().is_initialized()),
-        CASE(!Endpoint().IsInternalSoftware()), CASE(!Endpoint().IsLoop()),
-        CASE(!Endpoint().IsPrivate()), CASE(!Endpoint().IsSoftware()),
-        CASE(!Endpoint().IsVirtual()), CASE(!Endpoint().SupportsBankSelect0()),
-        CASE(!Endpoint().SupportsBankSelect32()), CASE(!Endpoint().SupportsClock()),
-        CASE(!Endpoint().SupportsMTC()), CASE(!Endpoint().SupportsNotes()),
-        CASE(!Endpoint().SupportsProgramChange()),
-        CASE(!CompMIDIEndpointNames(Endpoint(), Endpoint()))));
+    ::testing::Values(CASE(Endpoint().GetUniqueID() == 0), CASE(Endpoint().GetEntity() == Entity()),
+                      CASE(Endpoint().GetChannelName(0) == kNone),
+                      CASE(Endpoint().GetChannels() == 0),
+                      CASE(Endpoint().GetEntityAndEndpointName() == kNone),
+                      CASE(Endpoint().GetSlotID() == SlotID()), CASE(!Endpoint().HasConnections()),
+                      CASE(!Endpoint().IsDeviceCommon()),
+                      CASE(!Endpoint().IsInterface().is_initialized()),
+                      CASE(!Endpoint().IsInternalSoftware()), CASE(!Endpoint().IsLoop()),
+                      CASE(!Endpoint().IsPrivate()), CASE(!Endpoint().IsSoftware()),
+                      CASE(!Endpoint().IsVirtual()), CASE(!Endpoint().SupportsBankSelect0()),
+                      CASE(!Endpoint().SupportsBankSelect32()), CASE(!Endpoint().SupportsClock()),
+                      CASE(!Endpoint().SupportsMTC()), CASE(!Endpoint().SupportsNotes()),
+                      CASE(!Endpoint().SupportsProgramChange()),
+                      CASE(!CompMIDIEndpointNames(Endpoint(), Endpoint()))));
 
-INSTANTIATE_TEST_SUITE_P(
-    Source, NullHandle,
-    ::testing::Values(CASE(Source().GetDirectSource() == Source()),
-                      CASE(Source().GetMatchingVirtualDestination() == Destination()),
-                      QUIET(Source().AddConnectedSource(Source())),
-                      QUIET(Source().RemoveConnectedSource(Source())),
-                      CASE(Source().CountConnectedSources() == 0),
-                      CASE(Source().GetConnectedSource(0) == Source()),
-                      CASE(Source().getDirectReceiver() == nullptr),
-                      CASE(!Source().hasDirectReceiver()),
-                      QUIET(Source().setDirectReceiver(nullptr))));
+INSTANTIATE_TEST_SUITE_P(Source, NullHandle,
+                         ::testing::Values(CASE(Source().GetDirectSource() == Source()),
+                                           CASE(Source().GetMatchingVirtualDestination() ==
+                                                Destination()),
+                                           QUIET(Source().AddConnectedSource(Source())),
+                                           QUIET(Source().RemoveConnectedSource(Source())),
+                                           CASE(Source().CountConnectedSources() == 0),
+                                           CASE(Source().GetConnectedSource(0) == Source()),
+                                           CASE(Source().getDirectReceiver() == nullptr),
+                                           CASE(!Source().hasDirectReceiver()),
+                                           QUIET(Source().setDirectReceiver(nullptr))));
 
 INSTANTIATE_TEST_SUITE_P(
     Destination, NullHandle,
@@ -146,21 +152,20 @@ INSTANTIATE_TEST_SUITE_P(
 
 INSTANTIATE_TEST_SUITE_P(
     Setup, NullHandle,
-    ::testing::Values(
-        CASE(TestSetup::Get().CreateEntity(Device(), "x", 1, 1) == Entity()),
-        QUIET(TestSetup::Get().DeleteDevice(Device())),
-        QUIET(TestSetup::Get().DeleteEntity(Entity())),
-        QUIET(TestSetup::Get().SetEntitySources(Entity(), 1)),
-        QUIET(TestSetup::Get().SetEntityDestinations(Entity(), 1)),
-        QUIET(TestSetup::Get().DeleteVirtualEndpoint(Endpoint())),
-        QUIET(TestSetup::Get().DeleteBareEndpoint(Endpoint())),
-        CASE(TestSetup::Get().GetDevice(0) == Device()),
-        CASE(TestSetup::Get().GetDevice(-1) == Device()),
-        CASE(TestSetup::Get().GetEntity(0) == Entity()),
-        CASE(TestSetup::Get().GetSource(0) == Source()),
-        CASE(TestSetup::Get().GetDestination(0) == Destination()),
-        CASE(TestSetup::Get().GetPrivateSource(0) == Source()),
-        CASE(TestSetup::Get().GetPrivateDestination(0) == Destination())));
+    ::testing::Values(CASE(TestSetup::Get().CreateEntity(Device(), "x", 1, 1) == Entity()),
+                      QUIET(TestSetup::Get().DeleteDevice(Device())),
+                      QUIET(TestSetup::Get().DeleteEntity(Entity())),
+                      QUIET(TestSetup::Get().SetEntitySources(Entity(), 1)),
+                      QUIET(TestSetup::Get().SetEntityDestinations(Entity(), 1)),
+                      QUIET(TestSetup::Get().DeleteVirtualEndpoint(Endpoint())),
+                      QUIET(TestSetup::Get().DeleteBareEndpoint(Endpoint())),
+                      CASE(TestSetup::Get().GetDevice(0) == Device()),
+                      CASE(TestSetup::Get().GetDevice(-1) == Device()),
+                      CASE(TestSetup::Get().GetEntity(0) == Entity()),
+                      CASE(TestSetup::Get().GetSource(0) == Source()),
+                      CASE(TestSetup::Get().GetDestination(0) == Destination()),
+                      CASE(TestSetup::Get().GetPrivateSource(0) == Source()),
+                      CASE(TestSetup::Get().GetPrivateDestination(0) == Destination())));
 
 TEST(NullHandle, WritesNothingToXML) {
   MemoryPrefs prefs;

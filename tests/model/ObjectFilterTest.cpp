@@ -1,7 +1,6 @@
 // SPDX-License-Identifier: MIT
-#include "ostinet/ObjectFilter.h"
-
 #include "model/PropertyKeys.h"
+#include "ostinet/ObjectFilter.h"
 #include "support/StudioTest.h"
 
 namespace Ostinet::Testing {
@@ -62,8 +61,7 @@ TEST(ObjectFilter, AndOrAndNotOfEveryPairOfAnswers) {
         EXPECT_EQ(Ask(Answer(a) & (Answer(b) | Answer(c))), a && (b || c));
         EXPECT_EQ(Ask(!((Answer(a) | !Answer(b)) & Answer(c))), !((a || !b) && c));
         for (bool const d : {false, true}) {
-          EXPECT_EQ(Ask((Answer(a) & Answer(b)) | (Answer(c) & !Answer(d))),
-                    (a && b) || (c && !d));
+          EXPECT_EQ(Ask((Answer(a) & Answer(b)) | (Answer(c) & !Answer(d))), (a && b) || (c && !d));
         }
       }
     }

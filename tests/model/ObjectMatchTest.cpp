@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include <gtest/gtest.h>
 
+#include <array>
 #include <cstddef>
 #include <stdexcept>
 #include <string>
@@ -14,8 +15,14 @@ static_assert(sizeof(BreviaDestinationMatch) == 278, "the older system's record"
 static_assert(offsetof(BreviaDestinationMatch, fields.name) == 22, "the older system's record");
 static_assert(offsetof(BreviaDestinationMatch, software.long2) == 2, "the older system's record");
 
-bool operator==(MatchLevel const& a, MatchLevel const& b) {
-  return a.matchType == b.matchType && a.minRank == b.minRank && a.weight == b.weight;
+using Line = std::array<int, 3>;
+
+std::vector<Line> LinesOf(std::vector<MatchLevel> const& levels) {
+  std::vector<Line> lines;
+  for (MatchLevel const& level : levels) {
+    lines.push_back({level.matchType, level.minRank, level.weight});
+  }
+  return lines;
 }
 
 TEST(ObjectMatch, StartsWithNothingExamined) {
@@ -32,18 +39,10 @@ TEST(ObjectMatch, StartsWithNothingExamined) {
 }
 
 TEST(MatchLevels, AreTheListsThatHostsWeighBy) {
-  using OM = ObjectMatch;
-  EXPECT_EQ(StandardMatch(), (std::vector<MatchLevel>{{OM::kUniqueIDMatch, 2, 8},
-                                                      {OM::kUniqueIDMatch, 1, 6},
-                                                      {OM::kNameMatch, 1, 4},
-                                                      {OM::kManufacturerModelMatch, 3, 2},
-                                                      {OM::kConnectionMatch, 1, 1}}));
-  EXPECT_EQ(IDAndNameMatch(), (std::vector<MatchLevel>{{OM::kUniqueIDMatch, 2, 8},
-                                                       {OM::kUniqueIDMatch, 1, 4},
-                                                       {OM::kNameMatch, 1, 1}}));
-  EXPECT_EQ(NameAndIDMatch(), (std::vector<MatchLevel>{{OM::kNameMatch, 1, 2},
-                                                       {OM::kUniqueIDMatch, 2, 1},
-                                                       {OM::kUniqueIDMatch, 1, 1}}));
+  EXPECT_EQ(LinesOf(StandardMatch()),
+            (std::vector<Line>{{0, 2, 8}, {0, 1, 6}, {1, 1, 4}, {2, 3, 2}, {3, 1, 1}}));
+  EXPECT_EQ(LinesOf(IDAndNameMatch()), (std::vector<Line>{{0, 2, 8}, {0, 1, 4}, {1, 1, 1}}));
+  EXPECT_EQ(LinesOf(NameAndIDMatch()), (std::vector<Line>{{1, 1, 2}, {0, 2, 1}, {0, 1, 1}}));
 }
 
 TEST(MatchDataBytes, AreAValueOfBytes) {

@@ -1,4 +1,5 @@
 // SPDX-License-Identifier: MIT
+#include "model/UniqueIDIndex.h"
 #include "support/StudioTest.h"
 
 namespace Ostinet::Testing {
@@ -90,6 +91,18 @@ TEST_F(PropertyStoreTest, RemovingShowsTheParentsValueAndIsAChange) {
   EXPECT_THAT(peer.changedKeys, ElementsAre(UString("key")));
   peer.RemoveProperty("key");
   EXPECT_EQ(peer.changedKeys.size(), 2U);
+}
+
+TEST_F(PropertyStoreTest, AKeyMayBeTheStoresOwn) {
+  peer.SetInt("uniqueID", 31);
+  UString const& own = peer.OwnProperties().begin()->first;
+  peer.SetInt(own, 32);
+  EXPECT_FALSE(Impl::IsUniqueIDStored(31));
+  EXPECT_TRUE(Impl::IsUniqueIDStored(32));
+  peer.changedKeys.clear();
+  peer.RemoveProperty(own);
+  EXPECT_THAT(peer.changedKeys, ElementsAre(UString("uniqueID")));
+  EXPECT_FALSE(Impl::IsUniqueIDStored(32));
 }
 
 TEST_F(PropertyStoreTest, TouchingDoesNothing) {

@@ -1,9 +1,8 @@
 // SPDX-License-Identifier: MIT
-#include "model/PropertyXML.h"
-
 #include <random>
 
 #include "model/PropertyKeys.h"
+#include "model/PropertyXML.h"
 #include "support/StudioTest.h"
 
 namespace Ostinet::Testing {
@@ -21,20 +20,20 @@ class PropertyXMLTest : public StudioTest {
   PropertyXMLTest() { setup.SignIn("test", nullptr, &prefs); }
   ~PropertyXMLTest() override { setup.SignIn("test", nullptr, nullptr); }
 
-  /// What `peer` writes, under a root element.
-  std::string Write(TestPeer const& peer) {
+  /// What `store` writes, under a root element.
+  std::string Write(TestPeer const& store) {
     File const file{FileSpecification(prefs.FolderPath() + "/store.xml")};
     XMLLib::Writer writer(file);
     writer.StartElement("Properties");
-    peer.WriteProperties(writer);
+    store.WriteProperties(writer);
     writer.Close();
     std::vector<unsigned char> const bytes = file.Read();
     return std::string(bytes.begin(), bytes.end());
   }
-  static void Read(std::string const& xml, TestPeer& peer, bool skipIDs = false) {
+  static void Read(std::string const& xml, TestPeer& store, bool skipIDs = false) {
     XMLLib::Parser parser(xml.data(), xml.size());
     ASSERT_TRUE(parser.DownToChild("Properties"));
-    Impl::ReadProperties(parser, peer, skipIDs);
+    Impl::ReadProperties(parser, store, skipIDs);
   }
 
   TestPeer peer{setup};
@@ -42,7 +41,6 @@ class PropertyXMLTest : public StudioTest {
 };
 
 TEST_F(PropertyXMLTest, AnEmptyStoreWritesNothing) {
-  XMLLib::Parser parser(nullptr, 0);
   std::string const xml = Write(peer);
   XMLLib::Parser written(xml.data(), xml.size());
   ASSERT_TRUE(written.DownToChild());
@@ -99,9 +97,10 @@ TEST_F(PropertyXMLTest, AnElementWithoutAKeyIsSkipped) {
 }
 
 TEST_F(PropertyXMLTest, UnknownElementsAreSkippedWithWhatIsInThem) {
-  Read("<Properties><Real key='r'><Int key='x'>1</Int></Real><String key='s'>t</String>"
-       "</Properties>",
-       back);
+  Read(
+      "<Properties><Real key='r'><Int key='x'>1</Int></Real><String key='s'>t</String>"
+      "</Properties>",
+      back);
   EXPECT_EQ(back.OwnProperties().size(), 1U);
 }
 
@@ -118,9 +117,10 @@ TEST_F(PropertyXMLTest, AnImportLeavesIDsOutAndReadsTheRest) {
 
 // A Dict has no numbers.
 TEST_F(PropertyXMLTest, ANumberInADictIsLeftOut) {
-  Read("<Properties><Dict key='d'><Int key='i'>1</Int><String key='s'>t</String>"
-       "<String>no key</String></Dict></Properties>",
-       back);
+  Read(
+      "<Properties><Dict key='d'><Int key='i'>1</Int><String key='s'>t</String>"
+      "<String>no key</String></Dict></Properties>",
+      back);
   PropertyDict dict;
   ASSERT_TRUE(back.GetDict("d", dict));
   EXPECT_EQ(dict.entries.size(), 1U);
@@ -128,10 +128,11 @@ TEST_F(PropertyXMLTest, ANumberInADictIsLeftOut) {
 }
 
 TEST_F(PropertyXMLTest, NumbersThatDoNotFitReadAsZero) {
-  Read("<Properties><Int key='max'>2147483647</Int><Int key='min'>-2147483648</Int>"
-       "<Int key='more'>2147483648</Int><Int key='huge'>99999999999999999999</Int>"
-       "<Int key='text'>abc</Int><Int key='none'/></Properties>",
-       back);
+  Read(
+      "<Properties><Int key='max'>2147483647</Int><Int key='min'>-2147483648</Int>"
+      "<Int key='more'>2147483648</Int><Int key='huge'>99999999999999999999</Int>"
+      "<Int key='text'>abc</Int><Int key='none'/></Properties>",
+      back);
   auto const number = [&](char const* key) {
     int value = -1;
     EXPECT_TRUE(back.GetInt(key, value)) << key;
@@ -158,9 +159,10 @@ TEST_F(PropertyXMLTest, AFileWithoutAPathIsAnEmptyOne) {
 }
 
 TEST_F(PropertyXMLTest, APathOfAnUnknownTypeIsEmpty) {
-  Read("<Properties><File key='a'><Path type='Elsewhere'>/a</Path></File>"
-       "<File key='b'><Path>/a</Path></File></Properties>",
-       back);
+  Read(
+      "<Properties><File key='a'><Path type='Elsewhere'>/a</Path></File>"
+      "<File key='b'><Path>/a</Path></File></Properties>",
+      back);
   UString path = "x";
   EXPECT_TRUE(back.GetFile("a", path));
   EXPECT_EQ(path, UString());
@@ -188,9 +190,11 @@ TEST_F(PropertyXMLTest, AFileThatDoesNotExistIsWrittenWithItsFullPath) {
 
 // A search, not a test of the front: studios were saved so.
 TEST_F(PropertyXMLTest, AFolderIsCutOutWhereverItOccursInThePath) {
+  if (prefs.folder.has_root_name()) {
+    GTEST_SKIP() << "a folder of a drive occurs at the front of paths only";
+  }
   MemoryPrefs other;
-  std::filesystem::path const inside =
-      other.folder / prefs.folder.relative_path() / "x.midnam";
+  std::filesystem::path const inside = other.folder / prefs.folder.relative_path() / "x.midnam";
   std::filesystem::create_directories(inside.parent_path());
   other.MakeFile((prefs.folder.relative_path() / "x.midnam").string());
   peer.SetFile("f", inside.string().c_str());
@@ -199,8 +203,9 @@ TEST_F(PropertyXMLTest, AFolderIsCutOutWhereverItOccursInThePath) {
   Read(xml, back);
   UString path;
   ASSERT_TRUE(back.GetFile("f", path));
-  EXPECT_EQ(path, prefs.FolderPath() +
-                      UString(std::filesystem::path("/x.midnam").make_preferred().string().c_str()));
+  EXPECT_EQ(path,
+            prefs.FolderPath() +
+                UString(std::filesystem::path("/x.midnam").make_preferred().string().c_str()));
 }
 
 TEST_F(PropertyXMLTest, WithoutAHostsFolderItsPathsAreLost) {

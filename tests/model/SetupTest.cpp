@@ -25,23 +25,24 @@ class CountingNames : public Impl::DestinationNames {
     int removals = 0;
     bool changes = true;  // what a renewal answers
   };
-  explicit CountingNames(Counts& counts) : counts_(counts) {}
+  explicit CountingNames(std::shared_ptr<Counts> counts) : counts_(std::move(counts)) {}
   bool Renew() override {
-    ++counts_.renewals;
-    return counts_.changes;
+    ++counts_->renewals;
+    return counts_->changes;
   }
-  void SaveEditedBanks() override { ++counts_.saves; }
-  void WillRemove() override { ++counts_.removals; }
+  void SaveEditedBanks() override { ++counts_->saves; }
+  void WillRemove() override { ++counts_->removals; }
 
  private:
-  Counts& counts_;
+  std::shared_ptr<Counts> const counts_;  // the studio outlives the test's own variables
 };
 
 class SetupTest : public StudioTest {
  protected:
-  Destination MakePortWithNames(CountingNames::Counts& counts, bool isPrivate = false) {
-    Destination const port =
-        setup.MakeDestination("Named", EndpointKind::Bare(true, isPrivate));
+  using Counts = std::shared_ptr<CountingNames::Counts>;
+
+  Destination MakePortWithNames(Counts const& counts, bool isPrivate = false) {
+    Destination const port = setup.MakeDestination("Named", EndpointKind::Bare(true, isPrivate));
     ImplOf(port)->SetNames(std::make_unique<CountingNames>(counts));
     return port;
   }
@@ -120,11 +121,11 @@ TEST_F(SetupTest, SignOutSavesBeforeTheListsEmpty) {
   Destination const hiddenToo = setup.MakeDestination("H", EndpointKind::Bare(true, true));
   int devices = 0;
   int saves = 0;
-  CountingNames::Counts counts;
+  Counts const counts = std::make_shared<CountingNames::Counts>();
   MakePortWithNames(counts);
   setup.onSaveDevices = [&] {
     devices = setup.CountDevices();
-    saves = counts.saves;
+    saves = counts->saves;
   };
   setup.calls.clear();
   setup.SignOut(true);
@@ -179,29 +180,29 @@ TEST_F(SetupTest, ARoundWithoutNewsTellsNobody) {
 }
 
 TEST_F(SetupTest, EveryThirtiethRoundSavesEditedBanksAlsoWithoutAListener) {
-  CountingNames::Counts counts;
-  CountingNames::Counts privateCounts;
+  Counts const counts = std::make_shared<CountingNames::Counts>();
+  Counts const privateCounts = std::make_shared<CountingNames::Counts>();
   MakePortWithNames(counts);
   MakePortWithNames(privateCounts, true);
   setup.SetListener(nullptr);
-  while (counts.saves == 0) {  // to a known place in the count
+  while (counts->saves == 0) {  // to a known place in the count
     setup.PollSetupChanges();
   }
   for (int round = 1; round < 30; ++round) {
     setup.changed = true;
     setup.PollSetupChanges();
     EXPECT_FALSE(setup.changed);
-    ASSERT_EQ(counts.saves, 1) << round;
+    ASSERT_EQ(counts->saves, 1) << round;
   }
   setup.PollSetupChanges();
-  EXPECT_EQ(counts.saves, 2);
-  EXPECT_EQ(privateCounts.saves, counts.saves);
+  EXPECT_EQ(counts->saves, 2);
+  EXPECT_EQ(privateCounts->saves, counts->saves);
 }
 
 TEST_F(SetupTest, ADeferralMovesTheSavingOfBanks) {
-  CountingNames::Counts counts;
+  Counts const counts = std::make_shared<CountingNames::Counts>();
   MakePortWithNames(counts);
-  while (counts.saves == 0) {
+  while (counts->saves == 0) {
     setup.PollSetupChanges();
   }
   for (int round = 1; round < 29; ++round) {
@@ -212,10 +213,10 @@ TEST_F(SetupTest, ADeferralMovesTheSavingOfBanks) {
     for (int i = 0; i < 5; ++i) {
       setup.PollSetupChanges();
     }
-    EXPECT_EQ(counts.saves, 1);
+    EXPECT_EQ(counts->saves, 1);
   }
   setup.PollSetupChanges();
-  EXPECT_EQ(counts.saves, 2);
+  EXPECT_EQ(counts->saves, 2);
 }
 
 TEST_F(SetupTest, ADeferralLetsPendingChangesLandFirst) {
@@ -336,7 +337,7 @@ TEST_F(SetupTest, PanicPassesOverPortsThatCannotSend) {
 }
 
 TEST_F(SetupTest, NamesAreRenewedWhenWhatTheyFollowFromChanges) {
-  CountingNames::Counts counts;
+  Counts const counts = std::make_shared<CountingNames::Counts>();
   Destination const port = MakePortWithNames(counts);
   for (char const* key : {"manufacturer", "model", "nameConfiguration", "supports General MIDI"}) {
     listener.names.clear();
@@ -344,23 +345,23 @@ TEST_F(SetupTest, NamesAreRenewedWhenWhatTheyFollowFromChanges) {
     setup.PollSetupChanges();
     EXPECT_THAT(listener.names, ElementsAre(RecordingListener::Patch(port, 65535))) << key;
   }
-  EXPECT_EQ(counts.renewals, 4);
+  EXPECT_EQ(counts->renewals, 4);
   port.SetRawName("Other");
   setup.PollSetupChanges();
-  EXPECT_EQ(counts.renewals, 4);
-  counts.changes = false;
+  EXPECT_EQ(counts->renewals, 4);
+  counts->changes = false;
   listener.names.clear();
   port.SetModel("Other");
   setup.PollSetupChanges();
-  EXPECT_EQ(counts.renewals, 5);
+  EXPECT_EQ(counts->renewals, 5);
   EXPECT_THAT(listener.names, IsEmpty());
 }
 
 TEST_F(SetupTest, TheNamesHearThatTheirDestinationGoes) {
-  CountingNames::Counts counts;
+  Counts const counts = std::make_shared<CountingNames::Counts>();
   Destination const port = MakePortWithNames(counts);
   setup.RemoveDestination(ImplOf(port));
-  EXPECT_EQ(counts.removals, 1);
+  EXPECT_EQ(counts->removals, 1);
 }
 
 TEST_F(SetupTest, TheListsGiveNullHandlesOutOfRange) {

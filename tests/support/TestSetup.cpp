@@ -73,8 +73,8 @@ Device TestSetup::MakeDevice(UString const& name, bool isDirect) {
 
 Entity TestSetup::MakeEntity(Device const& device, UString const& name, int sources,
                              int destinations) {
-  RCPtrMT<Impl::EntityImpl> impl(new Impl::EntityImpl(
-      std::make_unique<TestPeer>(*this, &PeerOf(device)), ImplOf(device)));
+  RCPtrMT<Impl::EntityImpl> impl(
+      new Impl::EntityImpl(std::make_unique<TestPeer>(*this, &PeerOf(device)), ImplOf(device)));
   GetStudio().entities.push_back(impl);
   ImplOf(device)->AddEntity(impl);
   impl->SetName(name);

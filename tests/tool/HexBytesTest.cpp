@@ -1,9 +1,8 @@
 // SPDX-License-Identifier: MIT
-#include "HexBytes.h"
-
 #include <gtest/gtest.h>
 
 #include "Errors.h"
+#include "HexBytes.h"
 
 namespace Ostinet::Tool {
 namespace {

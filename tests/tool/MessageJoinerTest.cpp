@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
-#include "MessageJoiner.h"
-
 #include <gtest/gtest.h>
+
+#include "MessageJoiner.h"
 
 namespace Ostinet::Tool {
 namespace {

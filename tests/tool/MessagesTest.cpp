@@ -1,9 +1,8 @@
 // SPDX-License-Identifier: MIT
-#include "Messages.h"
-
 #include <gtest/gtest.h>
 
 #include "Errors.h"
+#include "Messages.h"
 
 namespace Ostinet::Tool {
 namespace {

@@ -45,8 +45,8 @@ TEST_F(MonitorCommand, PrintsInputAsJSON) {
 
 // The road from end to end: out of a port, through its cable, and back in.
 TEST_F(MonitorCommand, SeesWhatItSendsComeBackThroughACable) {
-  ToolRun const run = Monitor(
-      kCabledStudio, {"In 1", "--json", "--count", "3", "--send", "Out 1: on 60 100 B0 07 7F pc 5"});
+  ToolRun const run = Monitor(kCabledStudio, {"In 1", "--json", "--count", "3", "--send",
+                                              "Out 1: on 60 100 B0 07 7F pc 5"});
   EXPECT_EQ(run.exitCode, kDone) << run.err;
   auto const lines = run.JSONLines();
   ASSERT_EQ(lines.size(), 3u);
@@ -61,28 +61,26 @@ TEST_F(MonitorCommand, SeesASysexComeBackWhole) {
     hex += " 2A";
   }
   hex += " F7";
-  ToolRun const run =
-      Monitor(kCabledStudio, {"--json", "--count", "1", "--send", "Out 1: " + hex});
+  ToolRun const run = Monitor(kCabledStudio, {"--json", "--count", "1", "--send", "Out 1: " + hex});
   auto const lines = run.JSONLines();
   ASSERT_EQ(lines.size(), 1u) << run.err;
   EXPECT_EQ(lines[0]["bytes"], hex);
 }
 
 TEST_F(MonitorCommand, ReceivesScheduledMessagesAtTheirDistance) {
-  ToolRun const run = Monitor(kCabledStudio, {"--json", "--count", "2", "--send",
-                                              "Out 1: on 60 100 +300 off 60"});
+  ToolRun const run =
+      Monitor(kCabledStudio, {"--json", "--count", "2", "--send", "Out 1: on 60 100 +300 off 60"});
   auto const lines = run.JSONLines();
   ASSERT_EQ(lines.size(), 2u) << run.err;
   EXPECT_EQ(lines[1]["bytes"], "80 3C 40");
-  auto const apart =
-      lines[1]["clocks"].get<long long>() - lines[0]["clocks"].get<long long>();
+  auto const apart = lines[1]["clocks"].get<long long>() - lines[0]["clocks"].get<long long>();
   // Stamps of input are in milliseconds, and the first message may be late on a busy machine.
   EXPECT_GT(apart, 100 * 10000);
 }
 
 TEST_F(MonitorCommand, HearsOnlyTheSourcesThatWereNamed) {
-  std::string const studio = StudioWithInput(InputAt(50, "In 1", "90 01 01") + "," +
-                                             InputAt(60, "In 2", "90 02 02"));
+  std::string const studio =
+      StudioWithInput(InputAt(50, "In 1", "90 01 01") + "," + InputAt(60, "In 2", "90 02 02"));
   ToolRun const run = Monitor(studio, {"in 2", "--json", "--count", "1"});
   auto const lines = run.JSONLines();
   ASSERT_EQ(lines.size(), 1u) << run.err;
@@ -90,21 +88,20 @@ TEST_F(MonitorCommand, HearsOnlyTheSourcesThatWereNamed) {
 }
 
 TEST_F(MonitorCommand, TellsMessagesInWords) {
-  ToolRun const run =
-      Monitor(StudioWithInput(InputAt(50, "In 1", "C1 05")), {"--count", "1"});
+  ToolRun const run = Monitor(StudioWithInput(InputAt(50, "In 1", "C1 05")), {"--count", "1"});
   EXPECT_EQ(run.out, "In 1                program change    ch 2   program 5\n") << run.err;
 }
 
 TEST_F(MonitorCommand, TellsBytesAndTimesWhenAsked) {
-  ToolRun const run = Monitor(StudioWithInput(InputAt(50, "In 1", "90 3C 40")),
-                              {"--count", "1", "--hex", "--ts"});
+  ToolRun const run =
+      Monitor(StudioWithInput(InputAt(50, "In 1", "90 3C 40")), {"--count", "1", "--hex", "--ts"});
   ASSERT_EQ(run.Lines().size(), 1u) << run.err;
   EXPECT_THAT(run.Lines()[0], testing::MatchesRegex(" *[0-9]+\\.[0-9]+  In 1 +90 3C 40"));
 }
 
 TEST_F(MonitorCommand, PrintsNoMoreThanTheCount) {
-  ToolRun const run = Monitor(kCabledStudio, {"--json", "--count", "2", "--send",
-                                              "Out 1: on 1 1 on 2 2 on 3 3 on 4 4"});
+  ToolRun const run = Monitor(
+      kCabledStudio, {"--json", "--count", "2", "--send", "Out 1: on 1 1 on 2 2 on 3 3 on 4 4"});
   EXPECT_EQ(run.JSONLines().size(), 2u);
   EXPECT_EQ(run.exitCode, kDone);
 }

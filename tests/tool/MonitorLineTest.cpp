@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
-#include "MonitorLine.h"
-
 #include <gtest/gtest.h>
+
+#include "MonitorLine.h"
 
 namespace Ostinet::Tool {
 namespace {

@@ -1,15 +1,17 @@
 // SPDX-License-Identifier: MIT
-#include "NameMatch.h"
-
 #include <gtest/gtest.h>
 
 #include "Errors.h"
+#include "NameMatch.h"
 
 namespace Ostinet::Tool {
 namespace {
 
-std::vector<Candidate> const kPorts = {
-    {"Interface 1", 11}, {"Interface 10", 12}, {"Soft Synth", 13}, {"soft synth", 14}, {"Drums", 15}};
+std::vector<Candidate> const kPorts = {{"Interface 1", 11},
+                                       {"Interface 10", 12},
+                                       {"Soft Synth", 13},
+                                       {"soft synth", 14},
+                                       {"Drums", 15}};
 
 size_t Match(std::string const& wanted) { return MatchName(kPorts, wanted, "destination"); }
 

@@ -27,10 +27,16 @@ TEST_F(SendCommand, SendsQuietly) {
 }
 
 TEST_F(SendCommand, TakesWordsInEveryForm) {
-  for (std::vector<std::string> const& words : std::vector<std::vector<std::string>>{
-           {"903C40"}, {"90", "3C", "40"}, {"on", "60", "100"}, {"off C4"}, {"pb", "-100"},
-           {"syx 41 10"}, {"--channel", "10", "on", "36", "100"}, {"pc", "5", "-c", "2", "pc", "6"},
-           {WriteFile("dump.syx", "\xF0\x41\xF7")}}) {
+  for (std::vector<std::string> const& words :
+       std::vector<std::vector<std::string>>{{"903C40"},
+                                             {"90", "3C", "40"},
+                                             {"on", "60", "100"},
+                                             {"off C4"},
+                                             {"pb", "-100"},
+                                             {"syx 41 10"},
+                                             {"--channel", "10", "on", "36", "100"},
+                                             {"pc", "5", "-c", "2", "pc", "6"},
+                                             {WriteFile("dump.syx", "\xF0\x41\xF7")}}) {
     std::vector<std::string> arguments = {"Out 1"};
     arguments.insert(arguments.end(), words.begin(), words.end());
     ToolRun const run = Send(arguments);
@@ -63,16 +69,17 @@ TEST_F(SendCommand, FailsForADestinationThatIsNotThere) {
 }
 
 TEST_F(SendCommand, NamesTheCandidatesOfAnAmbiguousName) {
-  ToolRun const run = RunOn(R"({ "ports": [ {"name": "Port A", "kind": "winmm-out", "technology": 1},
+  ToolRun const run =
+      RunOn(R"({ "ports": [ {"name": "Port A", "kind": "winmm-out", "technology": 1},
                                             {"name": "Port B", "kind": "winmm-out", "technology": 1} ] })",
-                            {"send", "Port", "F8"});
+            {"send", "Port", "F8"});
   EXPECT_EQ(run.exitCode, kFailed);
   EXPECT_THAT(run.err, HasSubstr("\"Port A\""));
   EXPECT_THAT(run.err, HasSubstr("\"Port B\""));
 }
 
 TEST_F(SendCommand, RefusesMalformedBytes) {
-  for (std::string const& words : {"90 3G 40", "90 3C", "3C 40", "903", "on 60", "on 200 1", "ch 17"}) {
+  for (char const* words : {"90 3G 40", "90 3C", "3C 40", "903", "on 60", "on 200 1", "ch 17"}) {
     ToolRun const run = Send({"Out 1", words});
     EXPECT_EQ(run.exitCode, kUsage) << words;
     EXPECT_EQ(run.out, "");
@@ -88,6 +95,32 @@ TEST_F(SendCommand, FailsForASysexFileThatCannotBeRead) {
   ToolRun const run = Send({"Out 1", PathOf("missing.syx")});
   EXPECT_EQ(run.exitCode, kFailed);
   EXPECT_THAT(run.err, HasSubstr("missing.syx"));
+}
+
+// The message of an hour from now cannot have gone out.
+TEST_F(SendCommand, FailsWhereItIsInterruptedBeforeTheEnd) {
+  if (!IsPOSIX()) {
+    GTEST_SKIP() << "needs a program that sends interrupts";
+  }
+  std::string const studio = WriteFile("studio.json", kCabledStudio);
+  ToolRun const run = RunShell(
+      "timeout --preserve-status -s INT 2 PROGRAM send 'Out 1' F8 +3600000 FA --studio \"" +
+      studio + "\" --settings \"" + PathOf("settings") + "\"");
+  EXPECT_EQ(run.exitCode, kFailed);
+  EXPECT_EQ(run.err, "ostinet: interrupted before all messages had gone out\n");
+}
+
+// More than a port's queue holds at once: what did not fit would be lost.
+TEST_F(SendCommand, LosesNothingOfALongSchedule) {
+  std::string words = "Out 1:";
+  for (int i = 0; i < 600; ++i) {
+    words += " +" + std::to_string(i) + " on " + std::to_string(i % 128) + " 1";
+  }
+  ToolRun const run =
+      RunOn(kCabledStudio, {"monitor", "--json", "--for", "60", "--count", "600", "--send", words});
+  auto const lines = run.JSONLines();
+  ASSERT_EQ(lines.size(), 600u) << run.err;
+  EXPECT_EQ(lines[599]["bytes"], "90 57 01");
 }
 
 TEST_F(SendCommand, PanicSilencesEverythingAndEnds) {

@@ -1,12 +1,11 @@
 // SPDX-License-Identifier: MIT
-#include "SendWords.h"
-
 #include <gtest/gtest.h>
 
 #include <filesystem>
 #include <fstream>
 
 #include "Errors.h"
+#include "SendWords.h"
 
 namespace Ostinet::Tool {
 namespace {
@@ -34,9 +33,7 @@ struct Case {
 
 class EachForm : public testing::TestWithParam<Case> {};
 
-TEST_P(EachForm, MakesItsMessages) {
-  EXPECT_EQ(Read(GetParam().arguments), GetParam().messages);
-}
+TEST_P(EachForm, MakesItsMessages) { EXPECT_EQ(Read(GetParam().arguments), GetParam().messages); }
 
 INSTANTIATE_TEST_SUITE_P(
     SendWords, EachForm,
@@ -54,7 +51,8 @@ INSTANTIATE_TEST_SUITE_P(
         Case{{"pb +8191"}, {"0: E0 7F 7F"}}, Case{{"pb 16383"}, {"0: E0 7F 7F"}},
         Case{{"syx F0 41 F7"}, {"0: F0 41 F7"}}, Case{{"syx 41 10"}, {"0: F0 41 10 F7"}},
         Case{{"syx 41 on 60 1"}, {"0: F0 41 F7", "0: 90 3C 01"}},
-        Case{{"start", "stop"}, {"0: FA", "0: FC"}}, Case{{"clock continue reset"}, {"0: F8", "0: FB", "0: FF"}},
+        Case{{"start", "stop"}, {"0: FA", "0: FC"}},
+        Case{{"clock continue reset"}, {"0: F8", "0: FB", "0: FF"}},
         Case{{"ch 16 pc 1 ch 1 pc 2"}, {"0: CF 01", "0: C0 02"}},
         Case{{"on 60 1 +500 off 60"}, {"0: 90 3C 01", "500: 80 3C 40"}},
         Case{{"+500 F8 +0 FA"}, {"0: FA", "500: F8"}},

@@ -1,9 +1,8 @@
 // SPDX-License-Identifier: MIT
-#include "StudioChanges.h"
-
 #include <gtest/gtest.h>
 
 #include "SomeStudio.h"
+#include "StudioChanges.h"
 
 namespace Ostinet::Tool {
 namespace {
@@ -26,8 +25,8 @@ TEST(FindChanges, TellsWhatWentBeforeWhatCame) {
   StudioView after = SomeStudio();
   after.sources.clear();
   after.destinations.push_back(SomeEndpoint(9, false, "New"));
-  EXPECT_EQ(Told(SomeStudio(), after), (Lines{"removed      source      In 1",
-                                             "added        destination New"}));
+  EXPECT_EQ(Told(SomeStudio(), after),
+            (Lines{"removed      source      In 1", "added        destination New"}));
 }
 
 TEST(FindChanges, TellsADeviceWithItsEndpoints) {
@@ -53,9 +52,8 @@ TEST(FindChanges, TellsTheNameBefore) {
 TEST(FindChanges, TellsConnectionsAtThePort) {
   StudioView after = SomeStudio();
   after.destinations[0].connected = {"Organ"};
-  EXPECT_EQ(Told(SomeStudio(), after),
-            (Lines{"disconnected destination Out 1  (Synth)",
-                   "connected    destination Out 1  (Organ)"}));
+  EXPECT_EQ(Told(SomeStudio(), after), (Lines{"disconnected destination Out 1  (Synth)",
+                                              "connected    destination Out 1  (Organ)"}));
 }
 
 TEST(FindChanges, TellsOtherFactsOnce) {

@@ -1,30 +1,28 @@
 // SPDX-License-Identifier: MIT
-#include "StudioText.h"
-
 #include <gtest/gtest.h>
 
 #include <nlohmann/json.hpp>
 
 #include "SomeStudio.h"
+#include "StudioText.h"
 
 namespace Ostinet::Tool {
 namespace {
 
 TEST(StudioLines, ShowTheStudioAsATree) {
-  EXPECT_EQ(StudioLines(SomeStudio()),
-            (std::vector<std::string>{
-                "Devices",
-                "  Synth  [Maker Model]  (online)  #101",
-                "    Port 1",
-                "      input  Synth  (online)  #103",
-                "      output Synth  (online, channels 1-4, 10)  #104",
-                "        on port Out 1",
-                "Inputs",
-                "  In 1  (online)  #105",
-                "Outputs",
-                "  Out 1  (online, interface)  #106",
-                "    carries Synth",
-            }));
+  EXPECT_EQ(StudioLines(SomeStudio()), (std::vector<std::string>{
+                                           "Devices",
+                                           "  Synth  [Maker Model]  (online)  #101",
+                                           "    Port 1",
+                                           "      input  Synth  (online)  #103",
+                                           "      output Synth  (online, channels 1-4, 10)  #104",
+                                           "        on port Out 1",
+                                           "Inputs",
+                                           "  In 1  (online)  #105",
+                                           "Outputs",
+                                           "  Out 1  (online, interface)  #106",
+                                           "    carries Synth",
+                                       }));
 }
 
 TEST(StudioLines, AreNoneForAnEmptyStudio) { EXPECT_TRUE(StudioLines({}).empty()); }
@@ -58,15 +56,15 @@ TEST(StudioJSON, HasTheKeysThatScriptsRelyOn) {
   auto const studio = nlohmann::ordered_json::parse(StudioJSON(SomeStudio()));
   EXPECT_EQ(KeysOf(studio), (std::vector<std::string>{"devices", "sources", "destinations"}));
   auto const& device = studio["devices"][0];
-  EXPECT_EQ(KeysOf(device),
-            (std::vector<std::string>{"name", "uniqueID", "manufacturer", "model", "direct",
-                                      "online", "entities"}));
+  EXPECT_EQ(KeysOf(device), (std::vector<std::string>{"name", "uniqueID", "manufacturer", "model",
+                                                      "direct", "online", "entities"}));
   auto const& entity = device["entities"][0];
   EXPECT_EQ(KeysOf(entity),
             (std::vector<std::string>{"name", "uniqueID", "sources", "destinations"}));
   std::vector<std::string> const endpointKeys = {
-      "name",    "uniqueID", "direct",      "online",             "software", "internalSoftware", "virtual",
-      "private", "channels", "isInterface", "scheduleAheadMuSec", "port",     "connected"};
+      "name",     "uniqueID", "direct",   "online",      "software",           "internalSoftware",
+      "virtual",  "private",  "channels", "isInterface", "scheduleAheadMuSec", "port",
+      "connected"};
   EXPECT_EQ(KeysOf(entity["destinations"][0]), endpointKeys);
   EXPECT_EQ(KeysOf(studio["sources"][0]), endpointKeys);
 }

@@ -2,6 +2,7 @@
 #include <gmock/gmock.h>
 
 #include <chrono>
+#include <filesystem>
 
 #include "RunTool.h"
 
@@ -13,9 +14,13 @@ using testing::HasSubstr;
 class Usage : public ToolTest {};
 
 TEST_F(Usage, HelpGoesToTheStandardOutput) {
-  for (std::vector<std::string> const& arguments : std::vector<std::vector<std::string>>{
-           {"--help"}, {"list", "--help"}, {"watch", "--help"}, {"monitor", "--help"},
-           {"send", "--help"}, {"panic", "--help"}}) {
+  for (std::vector<std::string> const& arguments :
+       std::vector<std::vector<std::string>>{{"--help"},
+                                             {"list", "--help"},
+                                             {"watch", "--help"},
+                                             {"monitor", "--help"},
+                                             {"send", "--help"},
+                                             {"panic", "--help"}}) {
     ToolRun const run = RunBare(arguments);
     EXPECT_EQ(run.exitCode, kDone);
     EXPECT_THAT(run.out, HasSubstr("--"));
@@ -31,14 +36,21 @@ TEST_F(Usage, HelpNamesEachCommand) {
 }
 
 TEST_F(Usage, WrongUsageEndsWithTwo) {
-  for (std::vector<std::string> const& arguments : std::vector<std::vector<std::string>>{
-           {}, {"dance"}, {"list", "--no-such-option"}, {"list", "surplus"}, {"watch", "--for", "x"},
-           {"watch", "--for", "-1"}, {"watch", "--count", "0"}, {"monitor", "--count"}}) {
+  for (std::vector<std::string> const& arguments :
+       std::vector<std::vector<std::string>>{{},
+                                             {"dance"},
+                                             {"list", "--no-such-option"},
+                                             {"list", "surplus"},
+                                             {"watch", "--for", "x"},
+                                             {"watch", "--for", "-1"},
+                                             {"watch", "--count", "0"},
+                                             {"monitor", "--count"}}) {
     ToolRun const run = RunBare(arguments);
     EXPECT_EQ(run.exitCode, kUsage);
     EXPECT_EQ(run.out, "");
-    EXPECT_NE(run.err, "");
+    EXPECT_EQ(std::count(run.err.begin(), run.err.end(), '\n'), 1) << run.err;
   }
+  EXPECT_THAT(RunBare({"dance"}).err, HasSubstr("there is no command or option \"dance\""));
 }
 
 TEST_F(Usage, TakesGlobalOptionsBeforeAndBehindTheCommand) {
@@ -63,7 +75,8 @@ TEST_F(Usage, AStudioFileThatIsNotThereFails) {
 }
 
 TEST_F(Usage, AStudioFileThatDoesNotParseFails) {
-  for (char const* text : {"", "{", "[1]", R"({"ports": 5})", R"({"ports": [{"name": "A", "kind": "no"}]})"}) {
+  for (char const* text :
+       {"", "{", "[1]", R"({"ports": 5})", R"({"ports": [{"name": "A", "kind": "no"}]})"}) {
     ToolRun const run = RunOn(text, {"list"});
     EXPECT_EQ(run.exitCode, kFailed) << text;
     EXPECT_EQ(run.out, "");
@@ -73,8 +86,8 @@ TEST_F(Usage, AStudioFileThatDoesNotParseFails) {
 
 TEST_F(Usage, ASettingsFolderThatCannotBeWrittenFails) {
   std::string const notAFolder = WriteFile("file", "content");
-  ToolRun const run = RunBare({"list", "--studio", WriteFile("studio.json", kCabledStudio),
-                               "--settings", notAFolder});
+  ToolRun const run = RunBare(
+      {"list", "--studio", WriteFile("studio.json", kCabledStudio), "--settings", notAFolder});
   EXPECT_EQ(run.exitCode, kFailed);
   EXPECT_EQ(run.out, "");
   EXPECT_THAT(run.err, HasSubstr("the settings folder"));
@@ -87,10 +100,48 @@ TEST_F(Usage, MakesTheSettingsFolderWithThoseAboveIt) {
   EXPECT_EQ(run.exitCode, kDone) << run.err;
 }
 
+TEST_F(Usage, GoesOnWithoutTheUsersOwnSettingsWhereTheyCannotBeKept) {
+  if (!IsPOSIX()) {
+    GTEST_SKIP() << "needs a folder that nobody can write to";
+  }
+  ToolRun const run = RunShell("XDG_CONFIG_HOME=/dev/null PROGRAM list --json --studio \"" +
+                               WriteFile("studio.json", kCabledStudio) + "\"");
+  EXPECT_EQ(run.exitCode, kDone);
+  EXPECT_EQ(nlohmann::json::parse(run.out)["sources"].size(), 1u);
+  EXPECT_THAT(run.err, HasSubstr("going on without settings"));
+}
+
+TEST_F(Usage, KeepsTheUsersOwnSettingsInTheirPlace) {
+  if (!IsPOSIX()) {
+    GTEST_SKIP() << "sets a variable as a POSIX shell does";
+  }
+  ToolRun const run =
+      RunShell("XDG_CONFIG_HOME=\"" + PathOf("config") + "\" PROGRAM list --studio \"" +
+               WriteFile("studio.json", kCabledStudio) + "\"");
+  EXPECT_EQ(run.exitCode, kDone) << run.err;
+  EXPECT_TRUE(std::filesystem::is_directory(PathOf("config") + "/ostinet"));
+}
+
+// Whether the machine of the test has MIDI or not: data stays clean, and a notice is one line that
+// says what to do.
+TEST_F(Usage, SaysOnceWhereTheMachineHasNoMIDI) {
+  if (!IsPOSIX()) {
+    GTEST_SKIP() << "unsets a variable as a POSIX shell does";
+  }
+  ToolRun const run = RunShell("env -u OSTINET_STUDIO PROGRAM list --json --settings \"" +
+                               PathOf("settings") + "\"");
+  EXPECT_EQ(run.exitCode, kDone) << run.err;
+  EXPECT_TRUE(nlohmann::json::parse(run.out).contains("devices"));
+  if (!run.err.empty()) {
+    EXPECT_THAT(run.err, HasSubstr("--studio FILE.json"));
+    EXPECT_EQ(std::count(run.err.begin(), run.err.end(), '\n'), 1) << run.err;
+  }
+}
+
 TEST_F(Usage, TheEnvironmentChoosesAStudioToo) {
   std::string const studio = WriteFile("studio.json", kCabledStudio);
-  std::string const set = IsPOSIX() ? "OSTINET_STUDIO=\"" + studio + "\" "
-                                    : "set \"OSTINET_STUDIO=" + studio + "\"&& ";
+  std::string const set =
+      IsPOSIX() ? "OSTINET_STUDIO=\"" + studio + "\" " : "set \"OSTINET_STUDIO=" + studio + "\"&& ";
   std::string const list = "PROGRAM list --json --settings \"" + PathOf("settings") + "\"";
   ToolRun const run = RunShell(set + list);
   ASSERT_EQ(run.exitCode, kDone) << run.err;
@@ -99,8 +150,8 @@ TEST_F(Usage, TheEnvironmentChoosesAStudioToo) {
 
 TEST_F(Usage, ABadStudioOfTheEnvironmentFails) {
   std::string const studio = WriteFile("studio.json", "{");
-  std::string const set = IsPOSIX() ? "OSTINET_STUDIO=\"" + studio + "\" "
-                                    : "set \"OSTINET_STUDIO=" + studio + "\"&& ";
+  std::string const set =
+      IsPOSIX() ? "OSTINET_STUDIO=\"" + studio + "\" " : "set \"OSTINET_STUDIO=" + studio + "\"&& ";
   ToolRun const run = RunShell(set + "PROGRAM list --settings \"" + PathOf("settings") + "\"");
   EXPECT_EQ(run.exitCode, kFailed);
   EXPECT_EQ(std::count(run.err.begin(), run.err.end(), '\n'), 1) << run.err;
@@ -115,9 +166,9 @@ TEST_F(Usage, AClosedPipeEndsQuietly) {
       "ports": [ {"name": "Out 1", "kind": "winmm-out"}, {"name": "In 1", "kind": "winmm-in"} ],
       "events": [ {"at-ms": 500, "input": {"port": "In 1", "bytes": "90 3C 40"}} ] })");
   auto const start = std::chrono::steady_clock::now();
-  ToolRun const run = RunShell("{ PROGRAM monitor --for 60 --studio \"" + studio +
-                               "\" --settings \"" + PathOf("settings") +
-                               "\"; echo \"exit $?\" >&2; } | true");
+  ToolRun const run =
+      RunShell("{ PROGRAM monitor --for 60 --studio \"" + studio + "\" --settings \"" +
+               PathOf("settings") + "\"; echo \"exit $?\" >&2; } | true");
   EXPECT_EQ(run.err, "exit 0\n");
   EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(50));
 }

@@ -43,8 +43,8 @@ TEST_F(WatchCommand, SeesPortsComeAndGo) {
 }
 
 TEST_F(WatchCommand, TellsPeopleInWords) {
-  ToolRun const run = Watch(StudioWithEvents(R"({"at-ms": 100, "remove": "In 1"})"),
-                            {"--count", "1"});
+  ToolRun const run =
+      Watch(StudioWithEvents(R"({"at-ms": 100, "remove": "In 1"})"), {"--count", "1"});
   EXPECT_EQ(run.out, "offline      source      In 1\n") << run.err;
 }
 

@@ -90,7 +90,6 @@ LegacyOutDevice::LegacyOutDevice(std::shared_ptr<Session> session)
 }
 
 LegacyOutDevice::~LegacyOutDevice() {
-  StopThread();
   waits_.CloseHandle(quitSemaphore_);
   waits_.CloseHandle(itemsSemaphore_);
 }
@@ -106,10 +105,16 @@ void LegacyOutDevice::Open(UINT device) {
 }
 
 void LegacyOutDevice::StopThread() {
-  if (thread_.joinable()) {
-    waits_.ReleaseSemaphore(quitSemaphore_, 1);
-    thread_.join();
+  constexpr int kTries = 16;
+  for (int tries = 0; tries < kTries; ++tries) {
+    if (waits_.ReleaseSemaphore(quitSemaphore_, 1)) {
+      thread_.join();
+      return;
+    }
   }
+  // A thread that cannot be woken must not hang the host. It sends nothing any more.
+  thread_.detach();
+  KeepForever(shared_from_this());
 }
 
 void LegacyOutDevice::Close() {

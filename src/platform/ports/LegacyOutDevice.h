@@ -21,7 +21,8 @@ class LegacyOutDevice : public std::enable_shared_from_this<LegacyOutDevice> {
   /// The packets that may wait; one more is lost.
   static constexpr LONG kMostWaiting = 256;
 
-  /// Starts the thread. Throws a VantorError when the system gives no semaphore or no thread.
+  /// Starts the thread, which Close ends. Throws a VantorError when the system gives no semaphore
+  /// or no thread.
   static std::shared_ptr<LegacyOutDevice> Make(std::shared_ptr<Session> session);
   ~LegacyOutDevice();
   LegacyOutDevice(LegacyOutDevice const&) = delete;

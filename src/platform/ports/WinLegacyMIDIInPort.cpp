@@ -15,8 +15,7 @@ WinLegacyMIDIInPort::WinLegacyMIDIInPort(WinMIDISetup& setup, std::shared_ptr<Se
 
 WinLegacyMIDIInPort::~WinLegacyMIDIInPort() { device_->Close(); }
 
-void WinLegacyMIDIInPort::Open(UINT device) {
-  MIDIINCAPSW caps{};
+void WinLegacyMIDIInPort::Open(UINT device, MIDIINCAPSW caps) {
   session_->GetSystem().midiInGetDevCapsW(device, &caps, sizeof caps);
   SetString(Keys::kName, TextOf(caps.szPname));
   SetInt(Keys::kWhichAPI, kLegacyAPI);

@@ -14,8 +14,9 @@ class WinLegacyMIDIInPort : public WinMIDIImplImpl {
   WinLegacyMIDIInPort(WinMIDISetup& setup, std::shared_ptr<Session> session);
   ~WinLegacyMIDIInPort() override;
 
-  /// Opens the system's device of that index. A failure is not told: nothing comes in then.
-  void Open(UINT device);
+  /// Opens the system's device of that index, which was listed with `caps`. A failure is not told:
+  /// nothing comes in then.
+  void Open(UINT device, MIDIINCAPSW caps);
   void Deactivate() override;
   /// Input is kept from here on, as far as the receiver, which may be null, wants it.
   void SetTarget(Source const& source, Receiver* receiver);

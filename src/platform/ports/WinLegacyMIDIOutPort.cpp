@@ -16,8 +16,7 @@ WinLegacyMIDIOutPort::WinLegacyMIDIOutPort(WinMIDISetup& setup, std::shared_ptr<
 
 WinLegacyMIDIOutPort::~WinLegacyMIDIOutPort() { device_->Close(); }
 
-void WinLegacyMIDIOutPort::Open(UINT device) {
-  MIDIOUTCAPSW caps{};
+void WinLegacyMIDIOutPort::Open(UINT device, MIDIOUTCAPSW caps) {
   session_->GetSystem().midiOutGetDevCapsW(device, &caps, sizeof caps);
   device_->Open(device);
   SetString(Keys::kName, TextOf(caps.szPname));

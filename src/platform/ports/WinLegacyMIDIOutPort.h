@@ -15,8 +15,9 @@ class WinLegacyMIDIOutPort : public WinMIDIImplImpl {
   WinLegacyMIDIOutPort(WinMIDISetup& setup, std::shared_ptr<Session> session);
   ~WinLegacyMIDIOutPort() override;
 
-  /// Opens the system's device of that index. A failure is not told: nothing is sent then.
-  void Open(UINT device);
+  /// Opens the system's device of that index, which was listed with `caps`. A failure is not told:
+  /// nothing is sent then.
+  void Open(UINT device, MIDIOUTCAPSW caps);
   void Deactivate() override;
   void SendSysex(TimeStamp stamp, RCPtrMT<SysexImpl> const& sysex) override;
 

@@ -43,20 +43,19 @@ std::shared_ptr<System> LoadStudio(std::string const& path) {
   return system;
 }
 
-std::shared_ptr<System> Choose() {
-  char const* const studio = std::getenv("OSTINET_STUDIO");
-  if (studio != nullptr && *studio != 0) return LoadStudio(studio);
+}  // namespace
+
+std::shared_ptr<System> ChooseSystem(char const* studioFile) {
+  if (studioFile != nullptr && *studioFile != 0) return LoadStudio(studioFile);
   if (auto machine = MakeMachineSystem()) return machine;
   return std::make_shared<Simulated::SimulatedSystem>();
 }
-
-}  // namespace
 
 std::shared_ptr<System> const& CurrentSystem() {
   Choice& choice = TheChoice();
   std::lock_guard lock(choice.mutex);
   if (choice.installed != nullptr) return choice.installed;
-  if (choice.automatic == nullptr) choice.automatic = Choose();
+  if (choice.automatic == nullptr) choice.automatic = ChooseSystem(std::getenv("OSTINET_STUDIO"));
   return choice.automatic;
 }
 

@@ -3,6 +3,7 @@
 
 #include <fcntl.h>
 #include <jack/jack.h>
+#include <signal.h>
 #include <spawn.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -84,12 +85,26 @@ std::string JackServer::Start() {
   return {};
 }
 
+void JackServer::Stop() { End(SIGTERM); }
+
+// JACK knows at most eight servers a machine, and forgets a killed one only when a server of the
+// same name starts and ends in order.
+void JackServer::Kill() {
+  End(SIGKILL);
+  wasKilled_ = true;
+}
+
 void JackServer::End(int signal) {
   if (process_ == 0) return;
   kill(process_, signal);
   waitpid(process_, nullptr, 0);
   process_ = 0;
-  RemoveRemains(name_);
+}
+
+JackServer::~JackServer() {
+  if (wasKilled_ && process_ == 0) Start();
+  Stop();
+  if (!name_.empty()) RemoveRemains(name_);
 }
 
 }  // namespace Ostinet::Testing

@@ -12,22 +12,23 @@ namespace Ostinet::Testing {
 class JackServer {
  public:
   JackServer() = default;
-  ~JackServer() { Stop(); }
+  ~JackServer();
   JackServer(JackServer const&) = delete;
   JackServer& operator=(JackServer const&) = delete;
 
   /// Empty once clients can connect, else why they cannot.
   std::string Start();
   /// Lets it end in its own way.
-  void Stop() { End(15); }
+  void Stop();
   /// Ends it in the middle of whatever it does.
-  void Kill() { End(9); }
+  void Kill();
 
  private:
   void End(int signal);
 
   pid_t process_ = 0;
   std::string name_;
+  bool wasKilled_ = false;
 };
 
 }  // namespace Ostinet::Testing

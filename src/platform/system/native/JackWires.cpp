@@ -27,6 +27,8 @@ constexpr std::size_t kMaxPiece = 16000;
 constexpr std::size_t kOverhead = 12;
 // The window of two cycles: whatever was sent before it began has left the ring.
 constexpr std::uint64_t kWindowCycles = 2;
+// A server joins ports from a later cycle on; what a wire sent before would reach nobody.
+constexpr std::uint64_t kJoinCycles = 3;
 
 constexpr char kWirePortName[] = "wire";
 
@@ -55,7 +57,10 @@ class JackOutputWire : public OutputWire {
 
   bool Open(std::string const& id) {
     midi_ = MakeJackMidi<RtMidiOut>(*client_, errors_, name_);
-    return midi_ && client_->Join(PortName(), id);
+    if (!midi_ || !client_->Join(PortName(), id)) return false;
+    windowEnd_ = client_->CycleCount() + kJoinCycles;
+    spent_ = allowance_;
+    return true;
   }
 
   bool Send(unsigned char const* bytes, std::size_t count) override {

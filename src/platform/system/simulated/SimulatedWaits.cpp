@@ -86,16 +86,16 @@ HANDLE SimulatedWaits::CreateEventW() {
 BOOL SimulatedWaits::SetEvent(HANDLE event) {
   long long failure = 0;
   if (book_.Fails(Op::kSetEvent, failure)) return static_cast<BOOL>(failure);
-  SignalQuietly(event);
-  return Done(Op::kSetEvent, TRUE);
+  return Done(Op::kSetEvent, SignalQuietly(event));
 }
 
-void SimulatedWaits::SignalQuietly(HANDLE event) {
+BOOL SimulatedWaits::SignalQuietly(HANDLE event) {
   std::lock_guard lock(mutex_);
+  BOOL const result = machine_->SetEvent(event);
   auto const found = shadows_.find(event);
-  if (found == shadows_.end()) return;
-  if (machine_->SetEvent(event) != FALSE) found->second.count = 1;
+  if (result != FALSE && found != shadows_.end()) found->second.count = 1;
   ++changes_;
+  return result;
 }
 
 HANDLE SimulatedWaits::CreateWaitableTimerW() {

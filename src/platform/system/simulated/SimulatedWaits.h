@@ -38,7 +38,7 @@ class SimulatedWaits final : public Waits {
   DWORD GetLastError() override;
 
   /// Signals an event without a trace in the book: what the system itself does.
-  void SignalQuietly(HANDLE event);
+  BOOL SignalQuietly(HANDLE event);
 
   /// The earliest time of a timer that waits for the hand.
   std::optional<std::int64_t> EarliestTimer() const;

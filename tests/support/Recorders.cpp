@@ -1,5 +1,5 @@
 // SPDX-License-Identifier: MIT
-#include "support/StudioTest.h"
+#include "support/Recorders.h"
 
 #include <fstream>
 #include <random>
