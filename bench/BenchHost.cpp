@@ -46,7 +46,6 @@ void BenchHost::AddPort(std::string const& name, SimulatedPort::Kind kind) {
   SimulatedPort port;
   port.name = name;
   port.kind = kind;
-  port.directMusic = false;
   port.external = true;
   midi.AddPort(port);
 }

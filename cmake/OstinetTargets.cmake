@@ -61,8 +61,7 @@ set(OSTINET_PRECOMPILED
 # All test programs share one precompiled header.
 function(ostinet_precompile_for_tests target)
   if(NOT TARGET ostinet_tests_precompiled)
-    # A program like those that use it, for the compiler asks that all flags be the same. It is
-    # never linked.
+    # A program like those that use it, for the compiler asks that all flags be the same.
     file(CONFIGURE OUTPUT ${PROJECT_BINARY_DIR}/precompiled.cpp CONTENT "int main() {}\n")
     add_executable(ostinet_tests_precompiled EXCLUDE_FROM_ALL ${PROJECT_BINARY_DIR}/precompiled.cpp)
     target_link_libraries(ostinet_tests_precompiled PRIVATE ostinet_internals ostinet_settings

@@ -58,7 +58,7 @@ void Send(GlobalOptions const& globals, std::string const& destination,
 CLI::Option* AddRepeatable(CLI::App& command, std::string const& name,
                            std::vector<std::string>& values, std::string const& help) {
   // One value at each place, however often it stands there.
-  return command.add_option(name, values, help)->allow_extra_args(false);
+  return command.add_option(name, values, help)->allow_extra_args(false)->type_name("");
 }
 
 }  // namespace

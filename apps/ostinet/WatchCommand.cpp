@@ -1,5 +1,6 @@
 // SPDX-License-Identifier: MIT
 #include <CLI/CLI.hpp>
+#include <cstdlib>
 
 #include "Commands.h"
 #include "Output.h"
@@ -67,6 +68,16 @@ class Watcher : public SetupListener {
   long long printed_ = 0;
 };
 
+// Complains in words; the library's own check prints the largest number that there is.
+std::function<std::string(std::string const&)> AtLeast(double least, std::string const& what) {
+  return [least, what](std::string const& text) {
+    char* end = nullptr;
+    double const value = std::strtod(text.c_str(), &end);
+    bool const fits = !text.empty() && *end == '\0' && value >= least;
+    return fits ? std::string() : "takes " + what + ", not \"" + text + "\"";
+  };
+}
+
 void Watch(GlobalOptions const& globals, Limits const& limits) {
   Watcher watcher;
   Session session(globals, nullptr, &watcher);
@@ -77,9 +88,11 @@ void Watch(GlobalOptions const& globals, Limits const& limits) {
 
 void AddLimits(CLI::App& command, Limits& limits) {
   command.add_option("--for", limits.seconds, "End after so many seconds")
-      ->check(CLI::NonNegativeNumber);
+      ->type_name("SECONDS")
+      ->check(AtLeast(0, "a number of seconds from 0 on"));
   command.add_option("--count", limits.count, "End after so many lines")
-      ->check(CLI::PositiveNumber);
+      ->type_name("LINES")
+      ->check(AtLeast(1, "a number of lines from 1 on"));
 }
 
 void AddWatchCommand(CLI::App& app, CommandLine& line) {

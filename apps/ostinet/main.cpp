@@ -21,7 +21,8 @@ void AddGlobals(CLI::App& app, GlobalOptions& options) {
 }
 
 void Describe(CLI::App& app) {
-  app.description("ostinet: the MIDI studio on the command line");
+  app.name("ostinet");
+  app.description("The MIDI studio on the command line");
   app.footer(
       "Names are taken exactly, else by an unambiguous beginning, else by an unambiguous part;"
       "\n#123 is the unique ID 123. Channels count from 1 to 16."
@@ -34,6 +35,15 @@ void Describe(CLI::App& app) {
 int Report(std::string const& sentence, int exitCode) {
   Notify(sentence);
   return exitCode;
+}
+
+// A command that does not exist would else be told as one that is missing.
+std::string UsageSentence(CLI::App const& app, CLI::ParseError const& error) {
+  std::vector<std::string> const unknown = app.remaining();
+  bool const isUnknownCommand = app.get_subcommands().empty() && !unknown.empty();
+  std::string const sentence =
+      isUnknownCommand ? "there is no command or option \"" + unknown.front() + "\"" : error.what();
+  return sentence + "; see ostinet --help";
 }
 
 int RunCommand(CommandLine const& line) {
@@ -65,8 +75,7 @@ int Main(int argc, char** argv) {
   } catch (CLI::Success const& help) {
     return app.exit(help, std::cout, std::cerr);
   } catch (CLI::ParseError const& error) {
-    app.exit(error, std::cout, std::cerr);
-    return kExitUsage;
+    return Report(UsageSentence(app, error), kExitUsage);
   }
   return RunCommand(line);
 }

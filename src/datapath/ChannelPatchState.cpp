@@ -49,6 +49,9 @@ void ChannelPatchState::Track(DataPacket const& packet) {
       expect = AfterStatus(byte);
       continue;
     }
+    if (expect == Expect::kNothing) {
+      continue;  // most bytes, in short
+    }
     switch (expect) {
       case Expect::kNothing:
         break;

@@ -48,8 +48,9 @@ TEST_F(Usage, WrongUsageEndsWithTwo) {
     ToolRun const run = RunBare(arguments);
     EXPECT_EQ(run.exitCode, kUsage);
     EXPECT_EQ(run.out, "");
-    EXPECT_NE(run.err, "");
+    EXPECT_EQ(std::count(run.err.begin(), run.err.end(), '\n'), 1) << run.err;
   }
+  EXPECT_THAT(RunBare({"dance"}).err, HasSubstr("there is no command or option \"dance\""));
 }
 
 TEST_F(Usage, TakesGlobalOptionsBeforeAndBehindTheCommand) {

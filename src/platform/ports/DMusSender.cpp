@@ -41,10 +41,12 @@ DWORD WordOf(unsigned char const* data, unsigned long long length) {
 class DMusSender::Packer {
  public:
   Packer(DMusSender& sender, REFERENCE_TIME time, unsigned char const* packetEnd)
-      : sender_(sender), buffer_(*sender.loan_->buffer.get()), time_(time), end_(packetEnd) {
-    buffer_.GetUsedBytes(&used_);
-    buffer_.GetMaxBytes(&max_);
-  }
+      : sender_(sender),
+        buffer_(*sender.loan_->buffer.get()),
+        time_(time),
+        end_(packetEnd),
+        used_(sender.bufferUsed_),
+        max_(sender.bufferMax_) {}
 
   void Pack(unsigned char const* piece, unsigned long long length) {
     bool const isSysex = *piece == 0xF0;
@@ -54,12 +56,11 @@ class DMusSender::Packer {
     while (start < total) {
       auto const n = static_cast<DWORD>(stop - start);
       MakeRoom(EventBytes(n));
-      if (isSysex) {
-        buffer_.PackUnstructured(time_, 0, n, const_cast<BYTE*>(piece + start));
-      } else {
-        buffer_.PackStructured(
-            time_, 0, WordOf(piece + start, static_cast<unsigned long long>(end_ - piece) - start));
-      }
+      auto const left = static_cast<unsigned long long>(end_ - piece) - start;
+      sender_.NotePacked(
+          isSysex ? buffer_.PackUnstructured(time_, 0, n, const_cast<BYTE*>(piece + start))
+                  : buffer_.PackStructured(time_, 0, WordOf(piece + start, left)),
+          EventBytes(n));
       start = stop;
       stop = std::min<unsigned long long>(total, stop + max_);
     }
@@ -78,8 +79,8 @@ class DMusSender::Packer {
   IDirectMusicBuffer& buffer_;
   REFERENCE_TIME const time_;
   unsigned char const* const end_;
-  DWORD used_ = 0;
-  DWORD max_ = 0;
+  DWORD used_;  // with what did not get through: room is planned for each piece
+  DWORD const max_;
 };
 
 DMusSender::DMusSender(RCPtrMT<ChannelPatchState> tracker, std::shared_ptr<DMusLine> line)
@@ -91,8 +92,10 @@ DMusSender::DMusSender(RCPtrMT<ChannelPatchState> tracker, std::shared_ptr<DMusL
   try {
     loan_ = BufferPool::Borrow(line_->session->Pool());
   } catch (VantorError const&) {
-    // No buffer: CanSend tells.
+    return;  // no buffer: CanSend tells
   }
+  loan_->buffer->GetUsedBytes(&bufferUsed_);
+  loan_->buffer->GetMaxBytes(&bufferMax_);
 }
 
 DMusSender::~DMusSender() {
@@ -130,16 +133,24 @@ void DMusSender::Flush() {
   if (!CanSend()) {
     return;
   }
-  DWORD used = 0;
-  loan_->buffer->GetUsedBytes(&used);
-  if (used > 0) {
+  if (bufferUsed_ > 0) {
     PlayAndFlush();
+  }
+}
+
+void DMusSender::NotePacked(HRESULT result, DWORD bytes) {
+  if (result == S_OK) {
+    bufferUsed_ += bytes;
+  } else {
+    loan_->buffer->GetUsedBytes(&bufferUsed_);
   }
 }
 
 void DMusSender::PlayAndFlush() {
   line_->port->PlayBuffer(loan_->buffer.get());
-  loan_->buffer->Flush();
+  if (loan_->buffer->Flush() == S_OK) {
+    bufferUsed_ = 0;
+  }
 }
 
 }  // namespace Ostinet::Impl

@@ -23,10 +23,15 @@ class DMusSender : public TrackingSender {
  private:
   class Packer;
   void PlayAndFlush();
+  void NotePacked(HRESULT result, DWORD bytes);
 
   std::shared_ptr<DMusLine> const line_;
   ComPtr<IReferenceClock> latencyClock_;
   BufferPool::Loan loan_;
+  // Of the borrowed buffer, which nobody else touches: asking it for each packet costs more than
+  // the packing.
+  DWORD bufferUsed_ = 0;
+  DWORD bufferMax_ = 0;
 };
 
 }  // namespace Ostinet::Impl

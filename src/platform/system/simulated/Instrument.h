@@ -21,7 +21,7 @@ std::vector<std::uint8_t> ParseHex(std::string const& text);
 /// An instrument behind an output: answers inquiries and remembers what it was told to play.
 ///
 /// Threads  Guarded by the studio's mutex.
-class Instrument : private StreamParser::Sink {
+class Instrument final : private StreamParser::Sink {
  public:
   explicit Instrument(SimulatedInstrument const& description);
 

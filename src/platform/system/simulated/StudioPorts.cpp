@@ -39,14 +39,13 @@ std::string const* Studio::Intern(std::string const& name) { return &*names_.ins
 bool Studio::RemovePorts(std::string const& name, SimulatedPort::Kind const* kind) {
   {
     std::lock_guard lock(mutex_);
-    auto const first =
-        std::stable_partition(ports_.begin(), ports_.end(), [&](PortPtr const& port) {
-          return *port->name != name || (kind != nullptr && port->spec.kind != *kind);
-        });
-    if (first == ports_.end()) return false;
-    // Whoever has one of them open keeps it, unplugged.
-    std::for_each(first, ports_.end(), [](PortPtr const& port) { port->present = false; });
-    ports_.erase(first, ports_.end());
+    auto const removed = std::erase_if(ports_, [&](PortPtr const& port) {
+      if (*port->name != name || (kind != nullptr && port->spec.kind != *kind)) return false;
+      // Whoever has it open keeps it, unplugged.
+      port->present = false;
+      return true;
+    });
+    if (removed == 0) return false;
     listsFresh_ = false;
   }
   NotifyIfWanted();
