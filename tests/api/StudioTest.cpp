@@ -55,7 +55,8 @@ Callbacks& TheCallbacks() {
 }
 
 // Before any test, since the first Setup::Instance of the program looks for them.
-bool const kAreCallbacksInstalled = (OstinetCallbackAPI::gInstance = &TheCallbacks()) != nullptr;
+[[maybe_unused]] bool const kAreCallbacksInstalled =
+    (OstinetCallbackAPI::gInstance = &TheCallbacks()) != nullptr;
 
 /// A signed-in host. The devices provider must outlive the setup, which goes with the process.
 class StudioHost : public ::testing::Test {
