@@ -25,25 +25,27 @@ TEST_P(OpposingNames, AreFoundAndJoined) {
 
 INSTANTIATE_TEST_SUITE_P(
     Table, OpposingNames,
-    testing::Values(
-        OpposingCase{"MIDI In 2", "MIDI Out 2", "MIDI In/Out 2"},
-        OpposingCase{"MIDI Out 2", "MIDI In 2", "MIDI In/Out 2"},
-        OpposingCase{"In", "Out", "In/Out"}, OpposingCase{"Out", "In", "In/Out"},
-        // The same text leaves the joined name as it was.
-        OpposingCase{"MIDI 1", "MIDI 1", "before"}, OpposingCase{"", "", "before"},
-        // Case counts, and so does every unit around the words.
-        OpposingCase{"MIDI In", "MIDI in", nullptr}, OpposingCase{"MIDI In", "MIDI out", nullptr},
-        OpposingCase{"MIDI In 2", "MIDI Out 3", nullptr},
-        OpposingCase{"MIDI In 2", "MIDI Out 22", nullptr},
-        OpposingCase{"AIDI In 2", "MIDI Out 2", nullptr},
-        OpposingCase{"MIDI Out 2", "AIDI In 2", nullptr},
-        OpposingCase{"MIDI Out 2", "MIDI In 3", nullptr}, OpposingCase{"Synth", "Synth 2", nullptr},
-        OpposingCase{"In", "In 2", nullptr}, OpposingCase{"Out", "", nullptr},
-        OpposingCase{"", "Out", nullptr},
-        // The first places count.
-        OpposingCase{"In In", "Out In", "In/Out In"}, OpposingCase{"In In", "In Out", nullptr},
-        // A failure of the first test goes on to the second.
-        OpposingCase{"In Out", "In In", "In In/Out"}, OpposingCase{"Out In", "In In", "In/Out In"}));
+    testing::Values(OpposingCase{"MIDI In 2", "MIDI Out 2", "MIDI In/Out 2"},
+                    OpposingCase{"MIDI Out 2", "MIDI In 2", "MIDI In/Out 2"},
+                    OpposingCase{"In", "Out", "In/Out"}, OpposingCase{"Out", "In", "In/Out"},
+                    // The same text leaves the joined name as it was.
+                    OpposingCase{"MIDI 1", "MIDI 1", "before"}, OpposingCase{"", "", "before"},
+                    // Case counts, and so does every unit around the words.
+                    OpposingCase{"MIDI In", "MIDI in", nullptr},
+                    OpposingCase{"MIDI In", "MIDI out", nullptr},
+                    OpposingCase{"MIDI In 2", "MIDI Out 3", nullptr},
+                    OpposingCase{"MIDI In 2", "MIDI Out 22", nullptr},
+                    OpposingCase{"AIDI In 2", "MIDI Out 2", nullptr},
+                    OpposingCase{"MIDI Out 2", "AIDI In 2", nullptr},
+                    OpposingCase{"MIDI Out 2", "MIDI In 3", nullptr},
+                    OpposingCase{"Synth", "Synth 2", nullptr}, OpposingCase{"In", "In 2", nullptr},
+                    OpposingCase{"Out", "", nullptr}, OpposingCase{"", "Out", nullptr},
+                    // The first places count.
+                    OpposingCase{"In In", "Out In", "In/Out In"},
+                    OpposingCase{"In In", "In Out", nullptr},
+                    // A failure of the first test goes on to the second.
+                    OpposingCase{"In Out", "In In", "In In/Out"},
+                    OpposingCase{"Out In", "In In", "In/Out In"}));
 
 // The second test does not ask where the second name has "In". Hosts' documents hold texts that
 // were joined so.
