@@ -23,7 +23,7 @@ struct Golden {
   char const* name;
 };
 
-constexpr Golden kGolden[] = {
+Golden const kGolden[] = {
     {"external-destination.ref", Testing::kExternalDestination, MatchObjectID(4), "Pad"},
     {"internal-source.ref", Testing::kInternalSource, MatchObjectID(3), "FX"},
     {"name-only.ref", Testing::kNameOnly, MatchObjectID(4), "AB"},
