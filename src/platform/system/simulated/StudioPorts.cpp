@@ -56,9 +56,8 @@ bool Studio::RemoveFirstPort(std::string const& name) {
   SimulatedPort::Kind kind;
   {
     std::lock_guard lock(mutex_);
-    auto const first = std::find_if(ports_.begin(), ports_.end(), [&](PortPtr const& port) {
-      return *port->name == name;
-    });
+    auto const first = std::find_if(ports_.begin(), ports_.end(),
+                                    [&](PortPtr const& port) { return *port->name == name; });
     if (first == ports_.end()) return false;
     kind = (*first)->spec.kind;
   }
