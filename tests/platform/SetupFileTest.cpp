@@ -4,6 +4,7 @@
 #include <fstream>
 #include <iterator>
 
+#include "core/AtomicFile.h"
 #include "platform/PlatformTest.h"
 
 namespace Ostinet::Testing {
@@ -92,14 +93,15 @@ TEST_F(SetupFile, SavingAndLoadingTwiceGivesTheSame) {
   SignIn();
   Device const device = setup.CreateDevice(UString("Synth"));
   setup.SetEntityDestinations(device.GetEntity(0), 3);
-  Dest("Out").AddConnectedDestination(device.GetEntity(0).GetDestination(1));
+  // The ends of a device bear the device's ID, so what is saved names the first of them.
+  Dest("Out").AddConnectedDestination(device.GetEntity(0).GetDestination(0));
   device.SetChannelName(3, UString("Bass"));
   SignOut(true);
   std::string const saved = Read();
   EXPECT_NE(saved.find("<Connection"), std::string::npos);
   SignIn();
   setup.PollSetupChanges();
-  Destination const again = setup.GetDevice(0).GetEntity(0).GetDestination(1);
+  Destination const again = setup.GetDevice(0).GetEntity(0).GetDestination(0);
   EXPECT_EQ(again.GetDirectDestination(), Dest("Out"));
   SignOut(true);
   EXPECT_EQ(Read(), saved);
@@ -123,11 +125,38 @@ TEST_F(SetupFile, AFolderThatIsGoneLosesTheSaveAndNothingElse) {
   AddOut("Out");
   SignIn();
   std::filesystem::remove_all(prefs.folder);
-  prefs.MakeFile("../" + prefs.folder.filename().string(), "no folder");
+  std::ofstream(prefs.folder) << "a file where the folder was";
   SignOut(true);
-  std::filesystem::remove(prefs.folder);
+  EXPECT_TRUE(std::filesystem::is_regular_file(prefs.folder));
+  std::filesystem::remove_all(prefs.folder);
   SignIn();
   EXPECT_THAT(DestNames(), ElementsAre("Out"));
+}
+
+// Each write fails once, as on a full disk; the studio in the file is never lost.
+TEST_F(SetupFile, ASaveThatFailsAtAnyWriteKeepsTheOldFile) {
+  AddOut("Out");
+  SignIn();
+  SignOut(true);
+  std::string const old = Read();
+  bool hasFailed = true;
+  for (int nth = 1; hasFailed; ++nth) {
+    ASSERT_LT(nth, 1000);
+    SignIn();
+    Dest("Out").SetModel(UString("changed"));
+    int left = nth;
+    hasFailed = false;
+    Impl::AtomicFile::SetFaultHook([&](Impl::AtomicFile::Step) {
+      hasFailed = hasFailed || --left == 0;
+      return left == 0 ? 28 : 0;  // no space left
+    });
+    SignOut(true);
+    Impl::AtomicFile::SetFaultHook({});
+    if (hasFailed) {
+      EXPECT_EQ(Read(), old) << nth;
+    }
+  }
+  EXPECT_NE(Read().find("changed"), std::string::npos);
 }
 
 TEST_F(SetupFile, AnImportedDeviceGetsNewIDsAndHangsOnThePortThatItNames) {
