@@ -18,6 +18,7 @@ void CallbackToReceiver(benchmark::State& state) {
   BenchHost host;
   auto const tapped = std::make_shared<TappedSystem>(host.midi.GetSystem());
   Impl::InstallSystem(tapped);
+  host.AddPort("Out", SimulatedPort::Kind::kWinMMOut);  // as many inputs are listed as outputs
   host.AddPort("In", SimulatedPort::Kind::kWinMMIn);
   host.SignIn();
   for (auto _ : state) {

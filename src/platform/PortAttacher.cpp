@@ -2,6 +2,8 @@
 
 #include "platform/PortAttacher.h"
 
+#include <utility>
+
 #include "model/DestinationImpl.h"
 #include "model/PropertyKeys.h"
 #include "ostinet/core/Error.h"
@@ -54,7 +56,12 @@ struct PortOpener : boost::static_visitor<void> {
 }  // namespace
 
 PortAttacher::PortAttacher(WinMIDISetup& setup, std::shared_ptr<Session> session)
-    : setup_(setup), session_(std::move(session)) {
+    : setup_(setup), session_(std::move(session)) {}
+
+void PortAttacher::IndexEndpoints() {
+  if (std::exchange(isIndexed_, true)) {
+    return;
+  }
   for (auto const& source : setup_.Lists().sources) {
     sources_[source->GetName()].push_back(source);
   }
@@ -70,10 +77,11 @@ bool PortAttacher::IsPair(EndpointImpl const& endpoint, PortInfo const& port) {
   // An input of WinMM is joined by its name alone, whatever kind the endpoint is of.
   bool const ofItsKind = boost::get<LegacyInput>(&port) != nullptr ||
                          endpoint.IsSoftware() != boost::apply_visitor(IsHardware(), port);
-  return ofItsKind && endpoint.GetName() == NameOfPort(port);
+  return ofItsKind;
 }
 
 void PortAttacher::Attach(PortInfo const& port) {
+  IndexEndpoints();
   try {
     AttachUnguarded(port);
   } catch (VantorError const&) {

@@ -13,12 +13,12 @@ namespace Ostinet::Impl {
 
 /// Brings listed ports and direct endpoints together: opens a port and installs it in the
 /// endpoint that stands for it, making that endpoint if there is none. Lives for one pass over a
-/// list of ports, for which it indexes the endpoints by name.
+/// list of ports, for which it indexes the endpoints by name once there is a port to attach.
 class PortAttacher {
  public:
   PortAttacher(WinMIDISetup& setup, std::shared_ptr<Session> session);
 
-  /// True if `endpoint` stands for `port`: of its name and of its kind.
+  /// True if `endpoint`, which bears the name of `port`, stands for it: is of its kind.
   static bool IsPair(EndpointImpl const& endpoint, PortInfo const& port);
 
   /// Attaches the port to the first endpoint that stands for it. One that does not open is left
@@ -28,6 +28,7 @@ class PortAttacher {
  private:
   using Index = std::unordered_map<UString, std::vector<RCPtrMT<EndpointImpl>>>;
 
+  void IndexEndpoints();
   void AttachUnguarded(PortInfo const& port);
   RCPtrMT<EndpointImpl> Find(PortInfo const& port) const;
   void AddEndpoint(PortInfo const& port, std::unique_ptr<WinMIDIPort> peer);
@@ -38,6 +39,7 @@ class PortAttacher {
   std::shared_ptr<Session> const session_;
   Index sources_;
   Index destinations_;
+  bool isIndexed_ = false;
 };
 
 }  // namespace Ostinet::Impl

@@ -2,7 +2,9 @@
 
 #include "platform/Reconciliation.h"
 
-#include <map>
+#include <algorithm>
+#include <utility>
+#include <vector>
 
 #include "model/DestinationImpl.h"
 #include "model/PropertyKeys.h"
@@ -13,18 +15,35 @@ namespace Ostinet::Impl {
 
 namespace {
 
-// Of two ports, or endpoints, of one name the later one counts.
-using PortsByName = std::map<UString, PortInfo const*>;
-using EndpointsByName = std::map<UString, RCPtrMT<EndpointImpl>>;
+// Sorted by name, each name once. A studio may have ten thousand of them, so they stand side by
+// side and their names are made once.
+template <class Thing>
+struct Named {
+  UString name;
+  Thing thing;
+};
+using PortsByName = std::vector<Named<PortInfo const*>>;
+using EndpointsByName = std::vector<Named<EndpointImpl*>>;
+
+/// Of two things of one name the later one counts.
+template <class List>
+void SortByName(List& list) {
+  std::stable_sort(list.begin(), list.end(),
+                   [](auto const& a, auto const& b) { return a.name < b.name; });
+  auto const ofOneName = [](auto const& a, auto const& b) { return a.name == b.name; };
+  list.erase(list.begin(), std::unique(list.rbegin(), list.rend(), ofOneName).base());
+}
 
 template <class Endpoints>
 EndpointsByName ByName(Endpoints const& endpoints) {
   EndpointsByName result;
+  result.reserve(endpoints.size());
   for (auto const& endpoint : endpoints) {
     if (endpoint->IsDirect() && !endpoint->IsVirtual() && !endpoint->IsInternalSoftware()) {
-      result[endpoint->GetName()] = endpoint;
+      result.push_back({endpoint->GetName(), endpoint.get()});
     }
   }
+  SortByName(result);
   return result;
 }
 
@@ -61,16 +80,16 @@ bool Merge(PortAttacher& attacher, PortsByName const& ports, EndpointsByName con
   auto endpoint = endpoints.begin();
   while (port != ports.end() || endpoint != endpoints.end()) {
     bool const isNewPort =
-        endpoint == endpoints.end() || (port != ports.end() && port->first < endpoint->first);
+        endpoint == endpoints.end() || (port != ports.end() && port->name < endpoint->name);
     if (isNewPort) {
-      attacher.Attach(*port->second);
+      attacher.Attach(*port->thing);
       changed = true;
       ++port;
-    } else if (port == ports.end() || endpoint->first < port->first) {
-      changed |= TakeOffline(*endpoint->second);
+    } else if (port == ports.end() || endpoint->name < port->name) {
+      changed |= TakeOffline(*endpoint->thing);
       ++endpoint;
     } else {
-      changed |= Join(attacher, *port->second, *endpoint->second);
+      changed |= Join(attacher, *port->thing, *endpoint->thing);
       ++port;
       ++endpoint;
     }
@@ -83,8 +102,10 @@ bool Merge(PortAttacher& attacher, PortsByName const& ports, EndpointsByName con
 bool Reconcile(WinMIDISetup& setup, PortAttacher& attacher, PortList const& ports) {
   PortsByName newSources, newDestinations;
   for (PortInfo const& port : ports) {
-    (IsSource(port) ? newSources : newDestinations)[NameOfPort(port)] = &port;
+    (IsSource(port) ? newSources : newDestinations).push_back({NameOfPort(port), &port});
   }
+  SortByName(newSources);
+  SortByName(newDestinations);
   EndpointsByName const sources = ByName(setup.Lists().sources);
   EndpointsByName const destinations = ByName(setup.Lists().destinations);
   bool const sourcesChanged = Merge(attacher, newSources, sources);
