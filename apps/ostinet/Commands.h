@@ -24,6 +24,9 @@ void AddWatchCommand(CLI::App& app, CommandLine& line);
 void AddMonitorCommand(CLI::App& app, CommandLine& line);
 void AddSendCommand(CLI::App& app, CommandLine& line);
 void AddPanicCommand(CLI::App& app, CommandLine& line);
+void AddRefCommand(CLI::App& app, CommandLine& line);
+void AddResolveCommand(CLI::App& app, CommandLine& line);
+void AddPairCommand(CLI::App& app, CommandLine& line);
 
 /// Adds --for and --count.
 void AddLimits(CLI::App& command, Limits& limits);

@@ -66,8 +66,8 @@ int Main(int argc, char** argv) {
   CommandLine line;
   Describe(app);
   AddGlobals(app, line.options);
-  for (auto const add :
-       {AddListCommand, AddWatchCommand, AddMonitorCommand, AddSendCommand, AddPanicCommand}) {
+  for (auto const add : {AddListCommand, AddWatchCommand, AddMonitorCommand, AddSendCommand,
+                         AddPanicCommand, AddRefCommand, AddResolveCommand, AddPairCommand}) {
     add(app, line);
   }
   try {

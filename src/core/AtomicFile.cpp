@@ -75,7 +75,7 @@ void AtomicFile::Commit() {
   FailOSErr(Try(Step::kFlush, [this] { return file_.Flush(); }));
   FailOSErr(Try(Step::kClose, [this] { return file_.Close(); }));
   FailOSErr(
-      Try(Step::kReplace, [this] { return SystemServices::ReplaceFile(temporary_, target_); }));
+      Try(Step::kReplace, [this] { return SystemServices::RenameOver(temporary_, target_); }));
   created_ = false;
 }
 

@@ -79,7 +79,7 @@ class FutureJob : public VantorJobQueueJob {
 
   void Run() override {
     try {
-      promise_.Complete(work_());
+      promise_.Complete(RunOnce());
     } catch (...) {
       promise_.Fail(VantorError::GetCurrentError());
     }
@@ -87,7 +87,13 @@ class FutureJob : public VantorJobQueueJob {
   void Cancel() override { promise_.Cancel(); }
 
  private:
-  std::function<T()> const work_;
+  /// Lets go of what the work holds before anyone hears of the outcome: who does may count on it.
+  T RunOnce() {
+    std::function<T()> const work = std::exchange(work_, nullptr);
+    return work();
+  }
+
+  std::function<T()> work_;
   VantorPromise<T> promise_;
 };
 

@@ -62,7 +62,7 @@ class OutputFile {
 /// The error number that says that a file is there already.
 int AlreadyExistsError();
 /// Gives the file `from` the name `to`, in one step, in place of a file that bears it.
-int ReplaceFile(std::filesystem::path const& from, std::filesystem::path const& to);
+int RenameOver(std::filesystem::path const& from, std::filesystem::path const& to);
 /// A number that no other running process has.
 unsigned long ProcessNumber();
 

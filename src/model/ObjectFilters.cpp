@@ -19,12 +19,12 @@ EndpointPredicate InterfaceIs(bool wanted, bool ifUnknown) {
 }  // namespace
 
 EndpointFilter& DirectEndpoint() {
-  static EndpointFilter filter(EndpointPredicate(&Endpoint::IsDirect));
+  static EndpointFilter filter{EndpointPredicate(&Endpoint::IsDirect)};
   return filter;
 }
 
 EndpointFilter& OnlineEndpoint() {
-  static EndpointFilter filter(EndpointPredicate(&Endpoint::IsOnline));
+  static EndpointFilter filter{EndpointPredicate(&Endpoint::IsOnline)};
   return filter;
 }
 
@@ -35,7 +35,7 @@ EndpointFilter& PublicEndpoint() {
 }
 
 EndpointFilter& SoftwareEndpoint() {
-  static EndpointFilter filter(EndpointPredicate(&Endpoint::IsSoftware));
+  static EndpointFilter filter{EndpointPredicate(&Endpoint::IsSoftware)};
   return filter;
 }
 
@@ -67,7 +67,7 @@ EndpointFilter& EntitylessNonSoftwareEndpoint() {
 }
 
 ObjectFilter<Device>& DirectDevice() {
-  static ObjectFilter<Device> filter(boost::function<bool(Device const&)>(&Device::IsDirect));
+  static ObjectFilter<Device> filter{boost::function<bool(Device const&)>(&Device::IsDirect)};
   return filter;
 }
 

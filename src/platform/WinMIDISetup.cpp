@@ -228,7 +228,7 @@ void WinMIDISetup::ProcessInput() {
 
 void WinMIDISetup::DrainPorts() {
   // The receiver may change the studio, so the list is walked over a copy.
-  auto const sources = activeSources_;
+  auto sources = CopyForDrain(activeSources_);
   for (auto const& source : sources) {
     WinMIDIPort* const port = WinMIDIPort::Of(*source);
     if (port == nullptr) {
@@ -241,13 +241,27 @@ void WinMIDISetup::DrainPorts() {
           ->DrainInput(GetReceiver(), Source(source));
     }
   }
+  GiveBackCopy(std::move(sources));
+}
+
+// The room of a copy is kept for the next one, so that a poll allocates nothing. A drain within a
+// drain finds none and makes its own.
+WinMIDISetup::Sources WinMIDISetup::CopyForDrain(Sources const& sources) {
+  Sources copy = std::move(roomForCopy_);
+  copy.assign(sources.begin(), sources.end());
+  return copy;
+}
+
+void WinMIDISetup::GiveBackCopy(Sources copy) {
+  copy.clear();
+  roomForCopy_ = std::move(copy);
 }
 
 void WinMIDISetup::DrainVirtualSources() {
   if (!virtualSourcesMutex_.tryLock()) {
     return;  // they wait for the next poll, which must never wait for them
   }
-  auto const sources = virtualSources_;
+  auto sources = CopyForDrain(virtualSources_);
   virtualSourcesMutex_.unlock();
   for (auto const& source : sources) {
     if (auto const* const peer = dynamic_cast<WinMIDIVirtSource const*>(source->Peer())) {
@@ -255,6 +269,7 @@ void WinMIDISetup::DrainVirtualSources() {
       queue->Drain(GetReceiver(), Source(source), true);
     }
   }
+  GiveBackCopy(std::move(sources));
 }
 
 }  // namespace Impl

@@ -68,6 +68,7 @@ class WinMIDISetup : public Setup, public WinMIDIDevicesListener {
   void PlatformPluginDestinationsChanged() override { MarkChanged(); }
 
  private:
+  using Sources = std::vector<RCPtrMT<EndpointImpl>>;
   using PendingChanges = std::map<RCPtrMT<DeviceObjectImpl>, PropertyKeys>;
 
   std::shared_ptr<Session> GetSession() const;
@@ -76,6 +77,8 @@ class WinMIDISetup : public Setup, public WinMIDIDevicesListener {
   void MarkOfflinePorts();
   void DrainPorts();
   void DrainVirtualSources();
+  Sources CopyForDrain(Sources const& sources);
+  void GiveBackCopy(Sources copy);
   std::optional<PortList> CollectPorts();
   /// Hands the collected keys to their objects. True if an object in the studio changed.
   bool HandlePendingChanges(bool& connectionsChanged);
@@ -88,9 +91,10 @@ class WinMIDISetup : public Setup, public WinMIDIDevicesListener {
   std::shared_ptr<VantorFuture<PortList>> pollFuture_ OSTINET_GUARDED_BY(sessionMutex_);
 
   VantorCoreMutex virtualSourcesMutex_;
-  std::vector<RCPtrMT<EndpointImpl>> virtualSources_ OSTINET_GUARDED_BY(virtualSourcesMutex_);
+  Sources virtualSources_ OSTINET_GUARDED_BY(virtualSourcesMutex_);
 
-  std::vector<RCPtrMT<EndpointImpl>> activeSources_;
+  Sources activeSources_;
+  Sources roomForCopy_;
   PendingChanges pendingChanges_;
   bool setupChanged_ = false;
   bool isLoaded_ = false;  // in this signed-in period

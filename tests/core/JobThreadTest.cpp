@@ -48,6 +48,22 @@ TEST(JobThreads, HoldJobsUntilTheyAreStarted) {
   EXPECT_EQ(future->Try(kPatience), 5);
 }
 
+// Who takes down what the work used has the outcome as his sign that the thread is done with it.
+TEST(JobThreads, LetGoOfWhatTheWorkHoldsBeforeItsOutcomeIsTold) {
+  VantorJobThread thread("Test Thread");
+  std::shared_ptr<VantorFuture<int>> future;
+  bool wasTold = true;
+  std::shared_ptr<int> held(new int(5), [&](int* value) {
+    wasTold = future->IsComplete();
+    delete value;
+  });
+  future = thread.Post<int>([held] { return *held; });
+  held.reset();
+  thread.Start();
+  EXPECT_EQ(future->Try(kPatience), 5);
+  EXPECT_FALSE(wasTold);
+}
+
 TEST(JobThreads, PassErrorsToTheFutureAndGoOn) {
   VantorJobThread thread("Test Thread");
   thread.Start();

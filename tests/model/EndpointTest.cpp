@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include <boost/optional/optional_io.hpp>
-#include <cstdlib>
 
+#include "core/SystemServices.h"
 #include "model/PropertyKeys.h"
 #include "model/StandaloneDevices.h"
 #include "support/StudioTest.h"
@@ -17,11 +17,8 @@ using ::testing::IsEmpty;
 
 // The list of standalone devices is read once, so the folder is chosen before any test runs.
 bool const kResourcesAreChosen = [] {
-#if defined(_WIN32)
-  return _putenv_s("OSTINET_RESOURCES", OSTINET_MODEL_TEST_DATA) == 0;
-#else
-  return setenv("OSTINET_RESOURCES", OSTINET_MODEL_TEST_DATA, 1) == 0;
-#endif
+  SystemServices::SetEnvironment("OSTINET_RESOURCES", OSTINET_MODEL_TEST_DATA);
+  return true;
 }();
 
 class EndpointTest : public StudioTest {

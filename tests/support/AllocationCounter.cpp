@@ -9,9 +9,13 @@ namespace {
 
 std::atomic<std::size_t> gAllocations{0};
 
-void* Allocate(std::size_t size) {
+void* TryToAllocate(std::size_t size) noexcept {
   gAllocations.fetch_add(1, std::memory_order_relaxed);
-  void* const memory = std::malloc(size > 0 ? size : 1);
+  return std::malloc(size > 0 ? size : 1);
+}
+
+void* Allocate(std::size_t size) {
+  void* const memory = TryToAllocate(size);
   if (memory == nullptr) {
     throw std::bad_alloc();
   }
@@ -22,6 +26,10 @@ void* Allocate(std::size_t size) {
 
 void* operator new(std::size_t size) { return Allocate(size); }
 void* operator new[](std::size_t size) { return Allocate(size); }
+void* operator new(std::size_t size, std::nothrow_t const&) noexcept { return TryToAllocate(size); }
+void* operator new[](std::size_t size, std::nothrow_t const&) noexcept {
+  return TryToAllocate(size);
+}
 void operator delete(void* memory) noexcept { std::free(memory); }
 void operator delete[](void* memory) noexcept { std::free(memory); }
 void operator delete(void* memory, std::size_t) noexcept { std::free(memory); }

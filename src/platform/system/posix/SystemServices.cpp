@@ -142,7 +142,7 @@ int OutputFile::Close() {
 
 int AlreadyExistsError() { return EEXIST; }
 
-int ReplaceFile(std::filesystem::path const& from, std::filesystem::path const& to) {
+int RenameOver(std::filesystem::path const& from, std::filesystem::path const& to) {
   // A file that was there keeps its permissions.
   struct stat status {};
   if (::stat(to.c_str(), &status) == 0) {

@@ -80,6 +80,9 @@ class Studio : public std::enable_shared_from_this<Studio> {
   // Ports (StudioPorts.cpp).
   void AddPort(SimulatedPort const& spec);
   bool RemovePorts(std::string const& name, SimulatedPort::Kind const* kind);
+  /// The counterpart of adding one: takes away the port of that name that was added first, and
+  /// those of its kind that share the name.
+  bool RemoveFirstPort(std::string const& name);
   bool RenamePorts(std::string const& name, std::string const& newName);
   bool DuplicatePorts(std::string const& name);
   std::vector<SimulatedPort> Ports();

@@ -176,7 +176,7 @@ Pair ReadPair(Node const& node) {
 Action ReadRemoval(Node const& event, Studio& studio) {
   Node const node = event.At("remove");
   if (node.IsText()) {
-    return [&studio, name = event.Text("remove")] { studio.RemovePorts(name, nullptr); };
+    return [&studio, name = event.Text("remove")] { studio.RemoveFirstPort(name); };
   }
   node.Allow({"name", "kind"});
   auto const kind = ReadKind(node);

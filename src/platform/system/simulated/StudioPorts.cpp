@@ -52,6 +52,18 @@ bool Studio::RemovePorts(std::string const& name, SimulatedPort::Kind const* kin
   return true;
 }
 
+bool Studio::RemoveFirstPort(std::string const& name) {
+  SimulatedPort::Kind kind;
+  {
+    std::lock_guard lock(mutex_);
+    auto const first = std::find_if(ports_.begin(), ports_.end(),
+                                    [&](PortPtr const& port) { return *port->name == name; });
+    if (first == ports_.end()) return false;
+    kind = (*first)->spec.kind;
+  }
+  return RemovePorts(name, &kind);
+}
+
 bool Studio::RenamePorts(std::string const& name, std::string const& newName) {
   bool found = false;
   {

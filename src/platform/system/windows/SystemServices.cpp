@@ -135,7 +135,7 @@ int OutputFile::Close() {
 
 int AlreadyExistsError() { return ERROR_FILE_EXISTS; }
 
-int ReplaceFile(std::filesystem::path const& from, std::filesystem::path const& to) {
+int RenameOver(std::filesystem::path const& from, std::filesystem::path const& to) {
   constexpr DWORD kFlags = MOVEFILE_REPLACE_EXISTING | MOVEFILE_WRITE_THROUGH;
   return ::MoveFileExW(from.c_str(), to.c_str(), kFlags) != 0 ? 0 : LastError();
 }

@@ -1,0 +1,26 @@
+// SPDX-License-Identifier: MIT
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace Ostinet::Tool {
+
+/// An input and an output of one thing, by their names.
+struct NamePair {
+  enum class Kind { kSame, kOpposing, kRelated };
+  Kind kind;
+  std::string common;  ///< what to call them together
+  size_t source;       ///< places in the lists
+  size_t destination;
+};
+
+/// Which belong together. Each is in one pair at most: those of the same name first, then those
+/// that differ in "In" and "Out" alone, then those that share words.
+std::vector<NamePair> PairNames(std::vector<std::string> const& sources,
+                                std::vector<std::string> const& destinations);
+
+/// "same", "opposing" or "related".
+std::string KindText(NamePair::Kind kind);
+
+}  // namespace Ostinet::Tool

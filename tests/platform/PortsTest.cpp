@@ -1,0 +1,169 @@
+// SPDX-License-Identifier: MIT
+
+#include <gmock/gmock.h>
+
+#include "platform/PlatformTest.h"
+
+namespace Ostinet::Testing {
+namespace {
+
+using ::testing::ElementsAre;
+using Kind = SimulatedPort::Kind;
+
+class DirectMusicPort : public PlatformTest {
+ protected:
+  DirectMusicPort() {
+    midi.MoveClockByHand(1000000);
+    midi.SetStepPerReading(1);
+    midi.SetCollection({0, 1, 2});
+  }
+  /// A signed-in host with this one output.
+  Destination Open(SimulatedPort port) {
+    port.name = "Port";
+    port.kind = Kind::kDirectMusicOut;
+    midi.AddPort(port);
+    SignIn();
+    midi.SetStepPerReading(0);
+    return Dest("Port");
+  }
+  /// The latency as the library reads it from clocks that stand still.
+  int LatencyOf(long long microseconds) {
+    SignIn();
+    midi.SetStepPerReading(0);
+    SimulatedPort port;
+    port.name = "Port";
+    port.kind = Kind::kDirectMusicOut;
+    port.latencyMicroseconds = microseconds;
+    midi.AddPort(port);
+    Rescan();
+    return Dest("Port").GetAdvanceScheduleMicroseconds();
+  }
+  static SimulatedPort Synth() {
+    SimulatedPort port;
+    port.dls = true;
+    return port;
+  }
+};
+
+TEST_F(DirectMusicPort, LatencyIsRoundedDownToWholeMilliseconds) {
+  EXPECT_EQ(LatencyOf(1499), 1000);
+}
+
+TEST_F(DirectMusicPort, LatencyIsRoundedUpFromTheHalf) { EXPECT_EQ(LatencyOf(1500), 2000); }
+
+TEST_F(DirectMusicPort, OfEqualClocksHasNoLatency) { EXPECT_EQ(LatencyOf(0), 0); }
+
+TEST_F(DirectMusicPort, MeasuresItsLatencyAnewAtEachOpening) {
+  ASSERT_EQ(LatencyOf(3000), 3000);
+  Dest("Port").SetAdvanceScheduleMicroseconds(7);
+  SimulatedPort port = midi.Ports().front();
+  midi.RemovePort("Port");
+  Rescan();
+  midi.AddPort(port);
+  Rescan();
+  EXPECT_EQ(Dest("Port").GetAdvanceScheduleMicroseconds(), 3000);
+}
+
+TEST_F(DirectMusicPort, ASynthesizerGetsTheSetOnceAnOpening) {
+  Destination const synth = Open(Synth());
+  EXPECT_EQ(midi.CountDownloaded("Port"), 3);
+  EXPECT_TRUE(synth.SupportsGeneralMIDI());
+  Rescan();
+  EXPECT_EQ(midi.CountDownloaded("Port"), 3);
+  midi.LogCalls(true);
+  midi.TakeLog();
+  SignOut();
+  EXPECT_EQ(Log({"UnloadInstrument"}).size(), 3u);
+  EXPECT_EQ(midi.CountDownloaded("Port"), 0);
+}
+
+TEST_F(DirectMusicPort, AnInstrumentThatFailsIsSkipped) {
+  midi.Fail("DownloadInstrument", 2);
+  Open(Synth());
+  EXPECT_EQ(midi.CountDownloaded("Port"), 2);
+}
+
+TEST_F(DirectMusicPort, AMissingCollectionIsNoError) {
+  midi.Fail("GetObject");
+  EXPECT_TRUE(Open(Synth()).IsOnline());
+  EXPECT_EQ(midi.CountDownloaded("Port"), 0);
+}
+
+TEST_F(DirectMusicPort, ACollectionWithoutEndIsReadToABound) {
+  midi.SetEndless("EnumInstrument", true);
+  midi.Fail("DownloadInstrument");
+  EXPECT_TRUE(Open(Synth()).IsOnline());
+  midi.SetEndless("EnumInstrument", false);
+}
+
+TEST_F(DirectMusicPort, WithTheSoundsInHardwareSupportsGeneralMIDI) {
+  SimulatedPort port;
+  port.gmInHardware = true;
+  EXPECT_TRUE(Open(port).SupportsGeneralMIDI());
+  EXPECT_EQ(midi.CountDownloaded("Port"), 0);
+}
+
+TEST_F(DirectMusicPort, WithoutEitherDoesNot) {
+  EXPECT_FALSE(Open(SimulatedPort()).SupportsGeneralMIDI());
+}
+
+// Synthesizers ring out: the port stays active until its object dies.
+TEST_F(DirectMusicPort, AnOutputIsNotDeactivatedWhenItIsLetGo) {
+  Destination const out = Open(SimulatedPort());
+  midi.LogCalls(true);
+  midi.TakeLog();
+  midi.RemovePort("Port");
+  Rescan();
+  EXPECT_TRUE(Log({"Activate"}).empty());
+  EXPECT_FALSE(out.IsOnline());
+}
+
+TEST_F(DirectMusicPort, AnInputIsDeactivatedWhenItIsLetGo) {
+  AddNative("In", Kind::kDirectMusicIn);
+  SignIn();
+  midi.LogCalls(true);
+  midi.TakeLog();
+  midi.RemovePort("In");
+  Rescan();
+  EXPECT_EQ(Log({"Activate"}).size(), 1u);
+}
+
+class Editing : public PlatformTest {
+ protected:
+  Editing() { SignIn(); }
+};
+
+TEST_F(Editing, ANewDeviceHasOneEntityWithOneOfEach) {
+  Device const device = setup.CreateDevice(UString("Synth"));
+  ASSERT_EQ(device.CountEntities(), 1);
+  EXPECT_EQ(device.GetEntity(0).GetRawName(), UString("Port 1"));
+  EXPECT_EQ(device.GetEntity(0).CountSources(), 1);
+  EXPECT_EQ(device.GetEntity(0).CountDestinations(), 1);
+}
+
+TEST_F(Editing, CountsOfEndpointsGoUpAndDownToNothing) {
+  Entity const entity = setup.CreateDevice(UString("Synth")).GetEntity(0);
+  setup.SetEntitySources(entity, 3);
+  EXPECT_EQ(setup.CountSources(), 3);
+  setup.SetEntitySources(entity, -1);
+  setup.SetEntityDestinations(entity, -7);
+  EXPECT_EQ(setup.CountSources() + setup.CountDestinations(), 0);
+}
+
+TEST_F(Editing, AVirtualPairTakesTheIDOfItsReferenceWhereThatIsFree) {
+  auto const first =
+      setup.CreateVirtualEndpoint(UString("Loop"), Setup::kSourceEnd, Setup::kSourceEnd);
+  MatchData const reference = first.first.GetMatchData();
+  int const id = first.first.GetUniqueID();
+  auto const second = setup.CreateVirtualEndpoint(reference, Setup::kSourceEnd, Setup::kSourceEnd);
+  EXPECT_NE(second.first.GetUniqueID(), id);  // in use
+  EXPECT_NE(second.first.GetUniqueID(), 0);
+  setup.DeleteVirtualEndpoint(first.first);
+  setup.DeleteVirtualEndpoint(second.first);
+  auto const third = setup.CreateVirtualEndpoint(reference, Setup::kSourceEnd, Setup::kSourceEnd);
+  EXPECT_EQ(third.first.GetUniqueID(), id);
+  EXPECT_EQ(third.first.GetName(), UString("Loop"));
+}
+
+}  // namespace
+}  // namespace Ostinet::Testing

@@ -1,0 +1,184 @@
+// SPDX-License-Identifier: MIT
+
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+
+#include "core/AtomicFile.h"
+#include "platform/PlatformTest.h"
+
+namespace Ostinet::Testing {
+namespace {
+
+using ::testing::ElementsAre;
+using ::testing::IsEmpty;
+
+/// "Ostinet.xml" in the host's folder.
+class SetupFile : public PlatformTest {
+ protected:
+  void Write(std::string const& studio) {
+    prefs.MakeFile("Ostinet.xml", "<?xml version=\"1.0\"?>\n<Ostinet>" + studio);
+  }
+  void WriteWhole(std::string const& studio) { Write(studio + "</Ostinet>"); }
+  std::string Read() const {
+    std::ifstream stream(prefs.folder / "Ostinet.xml", std::ios::binary);
+    return {std::istreambuf_iterator<char>(stream), std::istreambuf_iterator<char>()};
+  }
+  static std::string Port(std::string const& element, std::string const& name, int id) {
+    return "<" + element + " direct=\"true\" software=\"false\">" + Properties(name, id) + "</" +
+           element + ">";
+  }
+  static std::string Properties(std::string const& name, int id) {
+    return "<Properties><String key=\"name\">" + name + "</String><Int key=\"uniqueID\">" +
+           std::to_string(id) + "</Int><String key=\"manufacturer\">Acme</String></Properties>";
+  }
+};
+
+TEST_F(SetupFile, AMissingOneIsNoError) {
+  AddOut("Out");
+  SignIn();
+  EXPECT_THAT(DestNames(), ElementsAre("Out"));
+}
+
+TEST_F(SetupFile, APortThatIsGoneIsThereOffline) {
+  WriteWhole(Port("Destination", "Gone", 77));
+  SignIn();
+  Destination const gone = Dest("Gone");
+  EXPECT_TRUE(gone.Exists());
+  EXPECT_TRUE(gone.IsDirect());
+  EXPECT_FALSE(gone.IsOnline());
+  EXPECT_EQ(OfflineProperty(gone), 1);
+  EXPECT_EQ(gone.GetUniqueID(), 77);
+  EXPECT_EQ(gone.GetManufacturer(), UString("Acme"));
+}
+
+TEST_F(SetupFile, APortThatIsThereJoinsItsEndpoint) {
+  AddOut("Out");
+  WriteWhole(Port("Destination", "Out", 78));
+  SignIn();
+  EXPECT_THAT(DestNames(), ElementsAre("Out"));
+  EXPECT_TRUE(Dest("Out").IsOnline());
+  EXPECT_EQ(Dest("Out").GetUniqueID(), 78);
+}
+
+TEST_F(SetupFile, ElementsThatCannotBeAreSkippedAndTheirSiblingsRead) {
+  WriteWhole("<Source direct=\"true\" software=\"true\">" + Properties("Soft", 1) + "</Source>" +
+             "<Source direct=\"false\" software=\"false\">" + Properties("Loose", 2) + "</Source>" +
+             "<Source software=\"false\">" + Properties("Unsaid", 3) + "</Source>" +
+             "<Device direct=\"true\"/><Device/><Stranger/>" + Port("Source", "Good", 4));
+  SignIn();
+  EXPECT_THAT(SourceNames(), ElementsAre("Good"));
+  EXPECT_EQ(setup.CountDevices(), 0);
+}
+
+TEST_F(SetupFile, EndpointsOfAnEntityMayStandInAnyOrder) {
+  WriteWhole("<Device direct=\"false\">" + Properties("Synth", 10) + "<Entity direct=\"false\">" +
+             Properties("Port", 11) + "<Destination direct=\"false\" software=\"false\">" +
+             Properties("First", 12) +
+             "</Destination><Source direct=\"false\" software=\"false\">" +
+             Properties("Second", 13) + "</Source><Source direct=\"true\" software=\"false\">" +
+             Properties("Direct", 14) + "</Source></Entity></Device>");
+  SignIn();
+  ASSERT_EQ(setup.CountDevices(), 1);
+  Entity const entity = setup.GetDevice(0).GetEntity(0);
+  ASSERT_EQ(entity.CountDestinations(), 1);
+  ASSERT_EQ(entity.CountSources(), 1);
+  EXPECT_EQ(entity.GetDestination(0).GetUniqueID(), 12);
+  EXPECT_EQ(entity.GetSource(0).GetUniqueID(), 13);
+}
+
+TEST_F(SetupFile, SavingAndLoadingTwiceGivesTheSame) {
+  AddOut("Out");
+  AddIn("In");
+  SignIn();
+  Device const device = setup.CreateDevice(UString("Synth"));
+  setup.SetEntityDestinations(device.GetEntity(0), 3);
+  // The ends of a device bear the device's ID, so what is saved names the first of them.
+  Dest("Out").AddConnectedDestination(device.GetEntity(0).GetDestination(0));
+  device.SetChannelName(3, UString("Bass"));
+  SignOut(true);
+  std::string const saved = Read();
+  EXPECT_NE(saved.find("<Connection"), std::string::npos);
+  SignIn();
+  setup.PollSetupChanges();
+  Destination const again = setup.GetDevice(0).GetEntity(0).GetDestination(0);
+  EXPECT_EQ(again.GetDirectDestination(), Dest("Out"));
+  SignOut(true);
+  EXPECT_EQ(Read(), saved);
+}
+
+TEST_F(SetupFile, WhatStandsBeforeTheDamageIsKept) {
+  Write(Port("Source", "Before", 20) +
+        "<Source direct=\"true\" soft<ware=" + Port("Source", "Behind", 21));
+  SignIn();
+  EXPECT_THAT(SourceNames(), ElementsAre("Before"));
+}
+
+TEST_F(SetupFile, VirtualEndpointsAreNotWritten) {
+  SignIn();
+  setup.CreateVirtualEndpoint(UString("Loop"), Setup::kSourceEnd, Setup::kSourceEnd);
+  SignOut(true);
+  EXPECT_EQ(Read().find("Loop"), std::string::npos);
+}
+
+TEST_F(SetupFile, AFolderThatIsGoneLosesTheSaveAndNothingElse) {
+  AddOut("Out");
+  SignIn();
+  std::filesystem::remove_all(prefs.folder);
+  std::ofstream(prefs.folder) << "a file where the folder was";
+  SignOut(true);
+  EXPECT_TRUE(std::filesystem::is_regular_file(prefs.folder));
+  std::filesystem::remove_all(prefs.folder);
+  SignIn();
+  EXPECT_THAT(DestNames(), ElementsAre("Out"));
+}
+
+// Each write fails once, as on a full disk; the studio in the file is never lost.
+TEST_F(SetupFile, ASaveThatFailsAtAnyWriteKeepsTheOldFile) {
+  AddOut("Out");
+  SignIn();
+  SignOut(true);
+  std::string const old = Read();
+  bool hasFailed = true;
+  for (int nth = 1; hasFailed; ++nth) {
+    ASSERT_LT(nth, 1000);
+    SignIn();
+    Dest("Out").SetModel(UString("changed"));
+    int left = nth;
+    hasFailed = false;
+    Impl::AtomicFile::SetFaultHook([&](Impl::AtomicFile::Step) {
+      hasFailed = hasFailed || --left == 0;
+      return left == 0 ? 28 : 0;  // no space left
+    });
+    SignOut(true);
+    Impl::AtomicFile::SetFaultHook({});
+    if (hasFailed) {
+      EXPECT_EQ(Read(), old) << nth;
+    }
+  }
+  EXPECT_NE(Read().find("changed"), std::string::npos);
+}
+
+TEST_F(SetupFile, AnImportedDeviceGetsNewIDsAndHangsOnThePortThatItNames) {
+  AddOut("Out");
+  SignIn();
+  UString const path = prefs.MakeFile(
+      "device.xml", "<Device direct=\"false\">" + Properties("Synth", 10) +
+                        "<Entity direct=\"false\">" + Properties("Port", 11) +
+                        "<Destination direct=\"false\" software=\"false\">" + Properties("In", 12) +
+                        "<Connection name=\"Out\" manufacturer=\"\" "
+                        "model=\"\"/></Destination></Entity></Device>");
+  XMLLib::Parser parser{File(FileSpecification(path))};
+  ASSERT_TRUE(parser.DownToChild());
+  Device const device = setup.CreateDevice(parser);
+  ASSERT_TRUE(device.Exists());
+  EXPECT_EQ(device.GetManufacturer(), UString("Acme"));
+  Destination const in = device.GetEntity(0).GetDestination(0);
+  EXPECT_NE(in.GetUniqueID(), 12);
+  EXPECT_NE(in.GetUniqueID(), 0);
+  setup.PollSetupChanges();
+  EXPECT_EQ(in.GetDirectDestination(), Dest("Out"));
+}
+
+}  // namespace
+}  // namespace Ostinet::Testing
