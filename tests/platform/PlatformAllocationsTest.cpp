@@ -108,8 +108,8 @@ class PlatformInputAllocations : public PlatformAllocations {
   void Arrive(std::string const& port) {
     for (int i = 0; i < 50; ++i) {
       midi.Inject(port, note);
+      midi.Settle();  // one at a time: how many pile up is not ours to say
     }
-    midi.Settle();
   }
   void WarmUp(std::string const& port) {
     for (int i = 0; i < 3; ++i) {
