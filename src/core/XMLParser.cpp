@@ -46,6 +46,14 @@ class OpenElement {
   Name const& GetName() const { return name_; }
   int Line() const { return line_; }
 
+  std::size_t CountAttributes() const { return ends_.size() / 2; }
+
+  void GetAttribute(std::size_t index, Name& name, UString& value) const {
+    std::size_t const nameEnd = ends_[index * 2];
+    name = Name(std::string(View(index == 0 ? 0 : ends_[index * 2 - 1], nameEnd)));
+    value = FromUTF8(View(nameEnd, ends_[index * 2 + 1]));
+  }
+
   bool FindAttribute(Name const& name, UString& value) const {
     std::size_t start = 0;
     for (std::size_t i = 0; i + 1 < ends_.size(); i += 2) {
@@ -216,6 +224,21 @@ bool Parser::ReadAttribute(Name const& name, UString& value) const {
 
 bool Parser::ReadReqAttribute(Name const& name, UString& value) const {
   return ReadAttribute(name, value);
+}
+
+std::size_t Parser::CountAttributes() const {
+  OpenElement const* const current = cursor_->Current();
+  return current == nullptr ? 0 : current->CountAttributes();
+}
+
+bool Parser::GetAttribute(std::size_t index, Name& name, UString& value) const {
+  if (index >= CountAttributes()) {
+    name = Name();
+    value.clear();
+    return false;
+  }
+  cursor_->Current()->GetAttribute(index, name, value);
+  return true;
 }
 
 UString Parser::ReadText() { return cursor_->Text(); }

@@ -452,6 +452,27 @@ TEST(XMLParser, TakesAllTheTextBetweenTwoChildrenAtOnce) {
   EXPECT_EQ(document->ReadText().string(), text);
 }
 
+TEST(XMLParser, ListsAttributesInTheOrderOfTheDocument) {
+  Document document("<R b='1' a='&#xE9;' c=''><A/></R>");
+  Name name("left over");
+  UString value("left over");
+  EXPECT_EQ(document->CountAttributes(), 0U);
+  EXPECT_FALSE(document->GetAttribute(0, name, value));
+  EXPECT_TRUE(name.empty());
+  EXPECT_TRUE(value.empty());
+  document->DownToChild();
+  std::string all;
+  for (std::size_t i = 0; document->GetAttribute(i, name, value); ++i) {
+    all += name.Text() + "=" + value.string() + ";";
+  }
+  EXPECT_EQ(all, "b=1;a=\xC3\xA9;c=;");
+  EXPECT_EQ(document->CountAttributes(), 3U);
+  document->DownToChild();
+  EXPECT_EQ(document->CountAttributes(), 0U);
+  document->UpToParent();
+  EXPECT_EQ(document->CountAttributes(), 3U);
+}
+
 TEST(XMLParser, KnowsWhitespace) {
   for (unsigned short unit = 0; unit < 0x3100; ++unit) {
     bool const expected = unit == 0x20 || unit == 0x09 || unit == 0x0A || unit == 0x0D;

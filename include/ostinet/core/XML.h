@@ -137,6 +137,10 @@ class OSTINET_EXPORT Parser {
   bool ReadReqAttribute(Name const& name, AttributeMap<T> const& map, T& value) const {
     return ReadAttribute(name, map, value);
   }
+  /// How many attributes the current element has, and one of them, from 0, in the document's order.
+  /// False, and both empty, for an index out of range.
+  std::size_t CountAttributes() const;
+  bool GetAttribute(std::size_t index, Name& name, UString& value) const;
   /// The character content of the current element from where the cursor stands to its next
   /// child, or to its end. Behind a child, after UpToParent, it gives the text that follows.
   UString ReadText();
