@@ -139,6 +139,9 @@ extern template class OSTINET_EXPORT RCPtrMT<Impl::DeviceImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::EntityImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::EndpointImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::DestinationImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::DeviceTypeInfoImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::AutodetectRequestImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::AutodetectResponseImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::SysexImpl>;
 
 /// Facts about the MIDI backend that is in use.

@@ -46,12 +46,14 @@ class OpenElement {
   Name const& GetName() const { return name_; }
   int Line() const { return line_; }
 
-  std::size_t CountAttributes() const { return ends_.size() / 2; }
-
-  void GetAttribute(std::size_t index, Name& name, UString& value) const {
-    std::size_t const nameEnd = ends_[index * 2];
-    name = Name(std::string(View(index == 0 ? 0 : ends_[index * 2 - 1], nameEnd)));
-    value = FromUTF8(View(nameEnd, ends_[index * 2 + 1]));
+  std::vector<Name> AttributeNames() const {
+    std::vector<Name> names;
+    std::size_t start = 0;
+    for (std::size_t i = 0; i + 1 < ends_.size(); i += 2) {
+      names.emplace_back(std::string(View(start, ends_[i])));
+      start = ends_[i + 1];
+    }
+    return names;
   }
 
   bool FindAttribute(Name const& name, UString& value) const {
@@ -213,6 +215,11 @@ int Parser::CurrentLine() const {
   return current == nullptr ? 1 : current->Line();
 }
 
+std::vector<Name> Parser::AttributeNames() const {
+  OpenElement const* const current = cursor_->Current();
+  return current == nullptr ? std::vector<Name>() : current->AttributeNames();
+}
+
 bool Parser::ReadAttribute(Name const& name, UString& value) const {
   OpenElement const* const current = cursor_->Current();
   if (current != nullptr && current->FindAttribute(name, value)) {
@@ -224,21 +231,6 @@ bool Parser::ReadAttribute(Name const& name, UString& value) const {
 
 bool Parser::ReadReqAttribute(Name const& name, UString& value) const {
   return ReadAttribute(name, value);
-}
-
-std::size_t Parser::CountAttributes() const {
-  OpenElement const* const current = cursor_->Current();
-  return current == nullptr ? 0 : current->CountAttributes();
-}
-
-bool Parser::GetAttribute(std::size_t index, Name& name, UString& value) const {
-  if (index >= CountAttributes()) {
-    name = Name();
-    value.clear();
-    return false;
-  }
-  cursor_->Current()->GetAttribute(index, name, value);
-  return true;
 }
 
 UString Parser::ReadText() { return cursor_->Text(); }

@@ -4,6 +4,7 @@
 #include <cstddef>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "ostinet/Export.h"
 #include "ostinet/core/Files.h"
@@ -123,6 +124,8 @@ class OSTINET_EXPORT Parser {
   Name const& CurrentElement() const;
   /// The line on which the current element starts, from 1.
   int CurrentLine() const;
+  /// The names of the current element's attributes, in the order of the document.
+  std::vector<Name> AttributeNames() const;
   /// The text of an attribute of the current element. False, and `value` empty, if it is absent.
   bool ReadAttribute(Name const& name, UString& value) const;
   bool ReadReqAttribute(Name const& name, UString& value) const;
@@ -137,10 +140,6 @@ class OSTINET_EXPORT Parser {
   bool ReadReqAttribute(Name const& name, AttributeMap<T> const& map, T& value) const {
     return ReadAttribute(name, map, value);
   }
-  /// How many attributes the current element has, and one of them, from 0, in the document's order.
-  /// False, and both empty, for an index out of range.
-  std::size_t CountAttributes() const;
-  bool GetAttribute(std::size_t index, Name& name, UString& value) const;
   /// The character content of the current element from where the cursor stands to its next
   /// child, or to its end. Behind a child, after UpToParent, it gives the text that follows.
   UString ReadText();
