@@ -25,8 +25,8 @@ void WriteNumber(XMLLib::Writer& writer, XMLLib::Name const& attribute, unsigned
 }
 
 MessageForm const* FindForm(unsigned char const* message) {
-  auto const* const form =
-      std::find_if(std::begin(kMessageForms), std::end(kMessageForms), [&](MessageForm const& each) {
+  auto const* const form = std::find_if(
+      std::begin(kMessageForms), std::end(kMessageForms), [&](MessageForm const& each) {
         return each.status == message[0] && (each.first != nullptr || each.control == message[1]);
       });
   return form == std::end(kMessageForms) ? nullptr : form;

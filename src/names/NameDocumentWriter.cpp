@@ -155,9 +155,8 @@ std::vector<WrittenBank> WriteBanks(File const& file, WrittenFor const& owner,
   }
   WriteSharedLists(writer, registry);
   writer.Close();
-  std::sort(written.begin(), written.end(), [](WrittenBank const& a, WrittenBank const& b) {
-    return a.listName < b.listName;
-  });
+  std::sort(written.begin(), written.end(),
+            [](WrittenBank const& a, WrittenBank const& b) { return a.listName < b.listName; });
   return written;
 }
 

@@ -39,7 +39,8 @@ class SharedLists {
       }
     }
     UString const name = MakeUniqueName(list.GetName(), [this](UString const& taken) {
-      return taken.empty() || std::any_of(entries_.begin(), entries_.end(), [&](Entry const& entry) {
+      return taken.empty() ||
+             std::any_of(entries_.begin(), entries_.end(), [&](Entry const& entry) {
                return entry.name.equal(taken, UString::kCatalogKey);
              });
     });
