@@ -140,6 +140,11 @@ extern template class OSTINET_EXPORT RCPtrMT<Impl::EntityImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::EndpointImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::DestinationImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::SysexImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::DestModeImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::DestNameSetImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::PatchBankImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::PatchImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::ValueListImpl>;
 
 /// Facts about the MIDI backend that is in use.
 ///
