@@ -44,6 +44,12 @@ void DestinationImpl::RenewNames() {
   }
 }
 
+void DestinationImpl::RenewNewNames() {
+  if (names_ != nullptr) {
+    names_->Renew();
+  }
+}
+
 NameFileStore* DestinationImpl::GetNameFileStore() const { return GetSetup().GetNameFileStore(); }
 
 MatchObjectID DestinationImpl::GetObjectID() const { return Destination::kObjectID; }

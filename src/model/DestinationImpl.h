@@ -40,6 +40,8 @@ class DestinationImpl : public EndpointImpl {
   void SetNames(std::unique_ptr<DestinationNames> names) { names_ = std::move(names); }
   /// Renews the names, and tells the listener if they changed.
   void RenewNames();
+  /// The same for a destination that the host does not know yet: it will hear of it as a whole.
+  void RenewNewNames();
   /// The written name documents in use; null while signed out.
   NameFileStore* GetNameFileStore() const;
 

@@ -43,18 +43,23 @@ class DestinationNameManager final : public DestinationTree {
 
  private:
   bool IsInStudio() const;
+  /// True if the destination is of another maker or model than at the last look.
   bool RememberDevice();
+  /// Asks the catalog for the device's master document; false without one.
   bool FindMasterFor(NameConfiguration& configuration) const;
+  NameFileStore* Store();
+  // Each claims the files that come before it lets go of those that leave.
   void Use(NameConfiguration const& next);
-  void LoadAnew();
+  void UseOverride(UString const& bankName, FileSpecification const& file,
+                   UString const& patchList);
+  void DropOverride(UString const& bankName);
+  void UseNewMaster(UString const& modeName);
+  void UseMasterOfStandardMode();
+  void WriteEditedBanks();
   void TellNamesChanged();
-  void ReplaceOverride(UString const& bankName, FileSpecification const& file,
-                       UString const& patchList);
-  void RemoveOverride(UString const& bankName);
-  void WriteMasterIfNone();
-  FileSpecification WriteMaster(UString const& modeName);
 
   NameConfiguration configuration_;  // in use
+  bool ownsUses_ = false;            // its files are counted
 };
 
 }  // namespace Ostinet::Impl

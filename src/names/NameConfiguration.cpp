@@ -63,7 +63,8 @@ NameConfiguration NameConfiguration::Read(ImplImpl const& peer) {
   if (PropertyDict const* const banks = Find<PropertyDict>(dict, kBanks)) {
     for (auto const& [bankName, value] : banks->entries) {
       PropertyDict const* const entry = boost::get<PropertyDict>(&value);
-      FileSpecification const file = entry != nullptr ? FindFile(*entry, kFile) : FileSpecification();
+      FileSpecification const file =
+          entry != nullptr ? FindFile(*entry, kFile) : FileSpecification();
       if (file.IsValid()) {
         UString const* const patchList = Find<UString>(*entry, kPatchNameList);
         result.SetOverride(bankName, file, patchList != nullptr ? *patchList : UString());

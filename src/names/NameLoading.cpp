@@ -121,8 +121,8 @@ bool ApplyNameSets(PropertyDict const& dict, NameTree& tree) {
   if (Names const* const names = Find<Names>(dict, SelectionKeys::kCurrentNameSets)) {
     std::size_t const count = std::min(names->size(), tree.currentNameSets.size());
     for (std::size_t channel = 0; channel < count; ++channel) {
-      changed |= SetIfFound(tree.currentNameSets[channel],
-                            FindNamed(tree.nameSets, (*names)[channel]));
+      changed |=
+          SetIfFound(tree.currentNameSets[channel], FindNamed(tree.nameSets, (*names)[channel]));
     }
   } else if (!tree.modes.empty()) {
     // Those of the first mode, even where another one is current: what a host sees after a mode
