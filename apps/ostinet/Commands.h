@@ -28,6 +28,7 @@ void AddRefCommand(CLI::App& app, CommandLine& line);
 void AddResolveCommand(CLI::App& app, CommandLine& line);
 void AddPairCommand(CLI::App& app, CommandLine& line);
 void AddTypesCommand(CLI::App& app, CommandLine& line);
+void AddNamesCommand(CLI::App& app, CommandLine& line);
 
 /// Adds --for and --count.
 void AddLimits(CLI::App& command, Limits& limits);
