@@ -140,6 +140,8 @@ extern template class OSTINET_EXPORT RCPtrMT<Impl::EntityImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::EndpointImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::DestinationImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::SysexImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::AutodetectRequestImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::AutodetectResponseImpl>;
 
 /// Facts about the MIDI backend that is in use.
 ///
