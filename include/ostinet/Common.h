@@ -143,8 +143,6 @@ extern template class OSTINET_EXPORT RCPtrMT<Impl::DeviceTypeInfoImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::AutodetectRequestImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::AutodetectResponseImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::SysexImpl>;
-extern template class OSTINET_EXPORT RCPtrMT<Impl::AutodetectRequestImpl>;
-extern template class OSTINET_EXPORT RCPtrMT<Impl::AutodetectResponseImpl>;
 
 /// Facts about the MIDI backend that is in use.
 ///

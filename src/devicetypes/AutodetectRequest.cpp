@@ -5,8 +5,6 @@
 
 namespace Ostinet {
 
-template class RCPtrMT<Impl::AutodetectRequestImpl>;
-
 namespace Autodetect {
 
 namespace {

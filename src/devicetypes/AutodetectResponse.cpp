@@ -6,8 +6,6 @@
 
 namespace Ostinet {
 
-template class RCPtrMT<Impl::AutodetectResponseImpl>;
-
 namespace Autodetect {
 
 namespace {
