@@ -2,6 +2,7 @@
 #pragma once
 
 #include <memory>
+#include <utility>
 #include <vector>
 
 #include "ostinet/Common.h"
@@ -19,6 +20,31 @@ class Request;
 namespace Impl {
 class DeviceTypeCatalogImpl;
 }
+
+/// The ports of one entity of an instrument, by name, seen from the instrument: what goes in is a
+/// destination of the studio, what comes out a source. A name is empty where the type gives none.
+struct DeviceTypePorts {
+  UString name;
+  std::vector<UString> ins;
+  std::vector<UString> outs;
+};
+
+/// What a device type tells of its instruments, for hosts that show it. A host that wants a device
+/// to be such an instrument calls Setup::ChangeDeviceType.
+struct DeviceTypeFacts {
+  UString image;              ///< a file name without its folder, or empty
+  ModelInfo inquiryResponse;  ///< all 0xFF: not known
+  bool hasDeviceID = false;   ///< whether the next three mean anything
+  unsigned char defaultDeviceID = 0xFF;
+  unsigned char minDeviceID = 0xFF;
+  unsigned char maxDeviceID = 0xFF;
+  unsigned short receiveMaxChannels = 16;   ///< 0 to 16
+  unsigned short transmitMaxChannels = 16;  ///< 0 to 16
+  /// What the type affirms or denies: the names of the device's properties ("is sampler"), in the
+  /// order in which they are set. What is not here is not known.
+  std::vector<std::pair<UString, bool>> flags;
+  std::vector<DeviceTypePorts> ports;  ///< one for each entity; empty: not known
+};
 
 /// An instrument model of the catalog. Immutable.
 ///
@@ -42,6 +68,8 @@ class OSTINET_EXPORT DeviceTypeInfo {
   /// True if the device's manufacturer and model are exactly this type's. False for a null handle
   /// of a type.
   bool MatchesDevice(Device const& device) const;
+  /// The defaults for a null handle.
+  DeviceTypeFacts GetFacts() const;
   /// The object behind the handle, null for a null handle.
   Impl::DeviceTypeInfoImpl* GetImplPtr() const { return impl_.get(); }
 

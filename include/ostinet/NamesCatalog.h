@@ -13,6 +13,10 @@
 
 namespace Ostinet {
 
+namespace Impl {
+struct ControlParts;
+}
+
 /// What selects a patch: program, and bank by its coarse and fine half. 255 means none.
 struct OSTINET_EXPORT PatchNumbers {
   unsigned char program, msb, lsb;
@@ -42,6 +46,11 @@ class OSTINET_EXPORT Names {
   UString const& GetName() const;
   bool operator==(Names const&) const;
   bool operator!=(Names const&) const;
+
+ private:
+  Type type_;
+  FileSpecification file_;
+  UString name_;
 };
 
 /// The name documents of this machine.
@@ -198,7 +207,12 @@ class OSTINET_EXPORT DefaultNoteNameList : public NoteNameListBase {
 };
 
 /// Which kind of message a control is.
-enum ControlType : int {};
+enum ControlType : int {
+  kControl7Bit = 0,   ///< a control change
+  kControl14Bit = 1,  ///< a pair of control changes
+  kControlRPN = 2,    ///< a registered parameter
+  kControlNRPN = 3,   ///< a parameter of the maker's own
+};
 
 /// One control of a patch: its number, its name, its range.
 ///
@@ -229,6 +243,20 @@ class OSTINET_EXPORT Control {
   int CountValueNames() const;
   std::pair<unsigned short, UString> GetValueName(int) const;
   UString GetNameForValue(unsigned short) const;
+
+ private:
+  friend struct Impl::ControlParts;
+
+  ControlType type_ = ControlType();
+  unsigned short number_ = 0;
+  bool hasValueRange_ = false;
+  bool hasDefaultValue_ = false;
+  double min_ = 0.0;
+  double max_ = 0.0;
+  double defaultValue_ = 0.0;
+  UString name_;
+  UString units_;
+  RCPtrMT<Impl::ValueListImpl> valueNames_;
 };
 
 /// What the controls of a patch are called.
