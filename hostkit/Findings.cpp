@@ -25,6 +25,10 @@ Types Common(Types const& types, Types const& others) {
   return common;
 }
 
+bool HasSameIdentity(DeviceTypeInfo const& a, DeviceTypeInfo const& b) {
+  return a.GetFacts().inquiryResponse == b.GetFacts().inquiryResponse;
+}
+
 bool IsRealID(int id) {
   return id != DetectionRun::kNoDeviceID && id != DetectionRun::kAllDeviceIDs;
 }
@@ -80,15 +84,20 @@ void Combine(Finding& known, Finding const& found) {
 
 bool HasIdentity(Hit const& hit) { return hit.captured[0] != kNotCaptured; }
 
+// Several types may have one identity, of which the library means the first.
 Types TypesOf(Autodetect::Response const& response, Hit const& hit) {
   DeviceTypeInfo const matched = response.GetMatchedDeviceTypeInfo(hit.captured);
+  if (!matched.Exists() && HasIdentity(hit)) {
+    return {};
+  }
   Types types;
   if (matched.Exists()) {
     types.push_back(matched);
   }
-  for (int i = 0; !HasIdentity(hit) && i < response.CountDeviceTypeInfos(); ++i) {
-    if (!Holds(types, response.GetDeviceTypeInfo(i))) {
-      types.push_back(response.GetDeviceTypeInfo(i));
+  for (int i = 0; i < response.CountDeviceTypeInfos(); ++i) {
+    DeviceTypeInfo const type = response.GetDeviceTypeInfo(i);
+    if (!Holds(types, type) && (!HasIdentity(hit) || HasSameIdentity(type, matched))) {
+      types.push_back(type);
     }
   }
   return types;
