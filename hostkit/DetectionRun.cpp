@@ -47,7 +47,9 @@ class DetectionRun::Impl {
       ports_.push_back({destination, Outcome::kWaiting, {}});
     }
     for (Source const& source : sources) {
-      listeners_.push_back({source, nullptr, nullptr});
+      if (!IsHeard(source)) {
+        listeners_.push_back({source, nullptr, nullptr});
+      }
     }
     if (options_.requests.empty()) {
       options_.requests = RequestsOfCatalog();
@@ -66,6 +68,12 @@ class DetectionRun::Impl {
     while (phase_ != Phase::kEnded && Advance(now)) {
     }
     return phase_ != Phase::kEnded;
+  }
+
+  // The host may be gone already: it hears of nothing any more.
+  void Drop() {
+    options_.onProgress = nullptr;
+    Cancel();
   }
 
   void Cancel() {
@@ -116,6 +124,11 @@ class DetectionRun::Impl {
     Receiver* before;  // the host's, which outlives the run
     std::unique_ptr<ReplyReader> reader;
   };
+
+  bool IsHeard(Source const& source) const {
+    return std::any_of(listeners_.begin(), listeners_.end(),
+                       [&](Listener const& listener) { return listener.source == source; });
+  }
 
   // One step of the present phase; false if nothing is due.
   bool Advance(double now) {
@@ -278,7 +291,7 @@ DetectionRun::DetectionRun(std::vector<Destination> const& destinations,
                            std::vector<Source> const& sources)
     : DetectionRun(destinations, sources, Options()) {}
 
-DetectionRun::~DetectionRun() { impl_->Cancel(); }
+DetectionRun::~DetectionRun() { impl_->Drop(); }
 
 std::vector<Destination> DetectionRun::DestinationsToAsk(std::vector<Endpoint> const& excluded) {
   Setup const& setup = Setup::Instance();

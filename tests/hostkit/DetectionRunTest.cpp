@@ -1,4 +1,6 @@
 // SPDX-License-Identifier: MIT
+#include <algorithm>
+
 #include "hostkit/DetectionTest.h"
 
 namespace Ostinet {
@@ -144,9 +146,13 @@ TEST_F(Detection, IgnoresPlayingMeanwhile) {
 
 TEST_F(Detection, CountsWhatHasComeOfAReplyWithoutEnd) {
   options.requests = {Inquiry()};
-  Begin();
-  midi.Inject("In 1", BytesOf("F0 7E 10 06 02 41 00 19 00 10 01"));
-  midi.Inject("In 1", BytesOf("90 3C 40"));
+  DetectionRun& run = Begin();
+  Bytes const beginning = BytesOf("F0 7E 10 06 02 41 00 19 00 10 01");
+  DataPacket packet;
+  packet.data = beginning.data();
+  packet.length = beginning.size();
+  run.HandlePacket(packet, Src("In 1"));
+  EXPECT_THAT(Run().Ports()[0].findings, IsEmpty()) << "it may go on";
   Pass(600.0);
   EXPECT_THAT(TextsOf(Run().Ports()[0].findings), ElementsAre("Synth #16"));
 }
@@ -281,7 +287,7 @@ TEST_F(Detection, TakesSeveralAnswersOfOneInstrumentTogether) {
 TEST_F(Detection, TakesAnUnknownIdentityAndAnAnswerOfItsMakerTogether) {
   options.requests = {Inquiry(), QuestionFor("F0 43 01 F7", "F0 43 01", {SomeType("Organ")})};
   AddIdentity("43 01 02 03 04", 2);
-  AddInstrument("F0 43 01 F7", "F0 43 01 F7");
+  AddInstrument("F0 43 01 F7", "F0 43 01 09 F7");
   auto const findings = RunAll();
   EXPECT_THAT(TextsOf(findings), ElementsAre("Organ #2"));
   EXPECT_EQ(findings.at(0).identity, BytesOf("43 01 02 03 04"));
@@ -299,7 +305,7 @@ TEST_F(Detection, NamesEveryTypeThatAnAnswerAllows) {
   options.requests = {
       QuestionFor("F0 41 01 F7", "F0 41 01",
                   {TypeWithIdentity("A", "41 FF FF 01 01 01 01"), SomeType("B"), SomeType("C")})};
-  AddInstrument("F0 41 01 F7", "F0 41 01 F7");
+  AddInstrument("F0 41 01 F7", "F0 41 01 09 F7");
   EXPECT_THAT(TextsOf(RunAll()), ElementsAre("B, A, C")) << "first the one that the library means";
 }
 
@@ -386,6 +392,17 @@ TEST_F(Detection, LeavesAPortThatIsPulledOut) {
   EXPECT_EQ(Run().Ports()[1].outcome, Outcome::kDone);
 }
 
+TEST_F(Detection, TellsNobodyWhenItIsDropped) {
+  options.requests = {Simple("42")};
+  int told = 0;
+  options.onProgress = [&] { ++told; };
+  Begin();
+  int const before = told;
+  Drop();
+  EXPECT_EQ(told, before);
+  EXPECT_FALSE(Src("In 1").hasDirectReceiver());
+}
+
 TEST_F(Detection, EndsWithTheSignOut) {
   options.requests = {Simple("42")};
   Begin();
@@ -406,25 +423,24 @@ TEST_F(Detection, IsDoneAtOnceWithoutPorts) {
 TEST_F(Detection, TellsItsProgress) {
   AddPair("2");
   options.requests = {Simple("42"), Simple("43")};
-  std::vector<double> fractions;
-  std::vector<std::size_t> requests;
-  options.onProgress = [&] {
-    // The first call comes from within the first step.
-    fractions.push_back(0.0);
-    requests.push_back(0);
-  };
+  int told = 0;
+  options.onProgress = [&] { ++told; };
   Begin();
-  while (Pass(0.05)) {
+  std::vector<double> fractions;
+  do {
     auto const progress = Run().GetProgress();
     EXPECT_EQ(progress.ports, 2u);
-    EXPECT_GE(progress.fraction, fractions.back());
-    fractions.back() = progress.fraction;
-    requests.back() = progress.request;
+    EXPECT_LE(progress.request, progress.requests);
+    EXPECT_TRUE(fractions.empty() || progress.fraction >= fractions.back());
     fractions.push_back(progress.fraction);
-    requests.push_back(progress.request);
-  }
+  } while (Pass(0.05));
+  EXPECT_EQ(fractions.front(), 0.0);
+  // Two questions and the wait at the end, on each of two ports.
+  fractions.erase(std::unique(fractions.begin(), fractions.end()), fractions.end());
+  EXPECT_EQ(fractions.size(), 6u);
   EXPECT_EQ(Run().GetProgress().fraction, 1.0);
   EXPECT_EQ(Run().GetProgress().port, 2u);
+  EXPECT_GE(told, 7);
 }
 
 TEST_F(Detection, HasTheInputToItselfAndGivesItBack) {

@@ -59,6 +59,7 @@ class DetectionTest : public PlatformTest {
   }
 
   DetectionRun& Run() { return *run_; }
+  void Drop() { run_ = nullptr; }
 
   /// Lets seconds pass. False if the run has ended.
   bool Pass(double seconds, double step = 0.05) {

@@ -238,30 +238,37 @@ TEST_F(ShippedDetection, AsksEveryDeviceIDThatATypeMayHave) {
   EXPECT_GT(asked, 300);
 }
 
-// The whole road: instruments behind the port, ten at a time with IDs of their own.
-TEST_F(ShippedDetection, FindsTheInstrumentsOfTheTablesBehindAPort) {
+// The whole road: instruments behind ports, twenty-five on each with IDs of their own, since all of
+// them answer at once and an input takes no more than its buffers.
+TEST_F(ShippedDetection, FindsTheInstrumentsOfTheTablesBehindPorts) {
+  constexpr std::size_t kOnEachPort = 25;
   auto const rows = ReadTable("inquiry.tsv");
-  std::map<int, Row> expected;
-  int found = 0;
-  for (std::size_t i = 0; i < rows.size() && i < 40; ++i) {
-    int const id = static_cast<int>(i);
+  for (std::size_t i = 0; i < rows.size(); ++i) {
+    std::string const number = std::to_string(i / kOnEachPort + 1);
+    if (i % kOnEachPort == 0 && i != 0) {
+      AddPair(number);
+    }
     SimulatedInstrument instrument;
-    instrument.out = "Out 1";
-    instrument.in = "In 1";
-    instrument.deviceID = id;
+    instrument.out = "Out " + number;
+    instrument.in = "In " + number;
+    instrument.deviceID = static_cast<int>(i % kOnEachPort);
     instrument.identity =
         HexOf(Concrete(IdentityText(rows[i]) + " " + rows[i].at("Revision bytes as read"), 0));
     midi.AddInstrument(instrument);
-    expected[id] = rows[i];
   }
-  for (DetectionRun::Finding const& finding : RunAll()) {
-    auto const row = expected.find(finding.deviceID);
-    ASSERT_NE(row, expected.end()) << finding.deviceID;
-    EXPECT_TRUE(IsNamed(finding, row->second))
-        << row->second.at("Model") << ": " << ModelsOf(finding);
-    ++found;
+  RunAll();
+  std::size_t found = 0;
+  for (DetectionRun::Port const& port : Run().Ports()) {
+    auto const number = std::stoul(port.destination.GetName().string().substr(4)) - 1;
+    for (DetectionRun::Finding const& finding : port.findings) {
+      std::size_t const place = number * kOnEachPort + static_cast<std::size_t>(finding.deviceID);
+      ASSERT_LT(place, rows.size());
+      EXPECT_TRUE(IsNamed(finding, rows[place]))
+          << rows[place].at("Model") << ": " << ModelsOf(finding);
+      ++found;
+    }
   }
-  EXPECT_EQ(found, static_cast<int>(expected.size()));
+  EXPECT_EQ(found, rows.size());
 }
 
 }  // namespace
