@@ -15,27 +15,47 @@ DestinationTree* DestinationTree::Of(Destination const& destination) {
   return Of(ImplOf(destination));
 }
 
+void DestinationTree::LoadTree(NameTree&) {}
+
+void DestinationTree::DropTree(bool loadsAnew) {
+  mustLoad_ = loadsAnew;
+  NameTree old;
+  old.Swap(tree_);
+}
+
+NameTree& DestinationTree::Tree() {
+  if (mustLoad_) {
+    mustLoad_ = false;
+    NameTree fresh;
+    LoadTree(fresh);
+    tree_.Swap(fresh);
+  }
+  return tree_;
+}
+
 DestNameSetImpl* DestinationTree::GetCurrentNameSet(int channel) const {
   bool const isChannel = channel >= 0 && channel < 16;
-  return isChannel ? tree_.currentNameSets[static_cast<std::size_t>(channel)].get() : nullptr;
+  return isChannel ? GetTree().currentNameSets[static_cast<std::size_t>(channel)].get() : nullptr;
 }
 
 void DestinationTree::SelectMode(RCPtrMT<DestModeImpl> const& mode) {
-  tree_.currentMode = mode;
-  tree_.currentNameSets = mode.get() != nullptr ? mode->GetNameSets() : ChannelNameSets();
+  NameTree& tree = Tree();
+  tree.currentMode = mode;
+  tree.currentNameSets = mode.get() != nullptr ? mode->GetNameSets() : ChannelNameSets();
   StoreSelection();
 }
 
 void DestinationTree::StoreSelection() {
+  NameTree const& tree = GetTree();
   ImplImpl& peer = *destination_.Peer();
   PropertyDict dict;
   peer.GetDict(Keys::kNameConfiguration, dict);
   std::vector<UString> names;
-  for (RCPtrMT<DestNameSetImpl> const& nameSet : tree_.currentNameSets) {
+  for (RCPtrMT<DestNameSetImpl> const& nameSet : tree.currentNameSets) {
     names.push_back(nameSet.get() != nullptr ? nameSet->GetName() : UString());
   }
   dict.entries[SelectionKeys::kCurrentMode] =
-      tree_.currentMode.get() != nullptr ? tree_.currentMode->GetName() : UString();
+      tree.currentMode.get() != nullptr ? tree.currentMode->GetName() : UString();
   dict.entries[SelectionKeys::kCurrentNameSets] = names;
   peer.SetDict(Keys::kNameConfiguration, dict);
 }

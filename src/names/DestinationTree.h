@@ -23,7 +23,8 @@ class DestinationTree : public DestinationNames {
   explicit DestinationTree(DestinationImpl& destination) : destination_(destination) {}
 
   DestinationImpl& GetDestination() const { return destination_; }
-  NameTree const& GetTree() const { return tree_; }
+  /// Loads it where that still waits.
+  NameTree const& GetTree() const { return const_cast<DestinationTree*>(this)->Tree(); }
   /// Null if there is none, and for a channel that is not 0 to 15.
   DestNameSetImpl* GetCurrentNameSet(int channel) const;
 
@@ -35,7 +36,12 @@ class DestinationTree : public DestinationNames {
   Banks const& GetEditedBanks() const { return editedBanks_; }
 
  protected:
-  NameTree& Tree() { return tree_; }
+  /// Fills a fresh tree, when somebody first asks for one.
+  virtual void LoadTree(NameTree& fresh);
+  /// The tree goes. The next one is loaded on demand, if `loadsAnew`.
+  void DropTree(bool loadsAnew);
+  bool IsTreeLoaded() const { return !mustLoad_; }
+  NameTree& Tree();
   Banks& EditedBanks() { return editedBanks_; }
   /// Writes what is selected into the "nameConfiguration" property, whose other entries stay.
   void StoreSelection();
@@ -43,6 +49,7 @@ class DestinationTree : public DestinationNames {
  private:
   DestinationImpl& destination_;
   NameTree tree_;
+  bool mustLoad_ = false;
   Banks editedBanks_;
 };
 
