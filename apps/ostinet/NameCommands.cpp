@@ -28,8 +28,7 @@ CLI::App* AddCommand(CLI::App& app, CommandLine& line, char const* name, char co
   command->callback([&line, options, show] {
     line.run = [&line, options, show] {
       Session const session(line.options, nullptr, nullptr);
-      show(line.options, *options,
-           FindAnyDestination(session.GetSetup(), options->destination));
+      show(line.options, *options, FindAnyDestination(session.GetSetup(), options->destination));
     };
   });
   return command;
@@ -108,18 +107,16 @@ void AddPatchesCommand(CLI::App& app, CommandLine& line) {
 
 void AddNotesCommand(CLI::App& app, CommandLine& line) {
   auto const options = std::make_shared<Options>();
-  AddPatchOptions(
-      *AddCommand(app, line, "notes", "List what the notes of a patch are called", options,
-                  ShowNotes),
-      *options);
+  AddPatchOptions(*AddCommand(app, line, "notes", "List what the notes of a patch are called",
+                              options, ShowNotes),
+                  *options);
 }
 
 void AddControlsCommand(CLI::App& app, CommandLine& line) {
   auto const options = std::make_shared<Options>();
-  AddPatchOptions(
-      *AddCommand(app, line, "controls", "List what the controls of a patch are called", options,
-                  ShowControls),
-      *options);
+  AddPatchOptions(*AddCommand(app, line, "controls", "List what the controls of a patch are called",
+                              options, ShowControls),
+                  *options);
 }
 
 }  // namespace Ostinet::Tool

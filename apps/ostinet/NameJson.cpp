@@ -63,9 +63,8 @@ Json NotesOf(NoteNameList const& notes) {
   Json array = Json::array();
   for (int i = 0; i < notes.CountNoteNames(); ++i) {
     auto const [pitch, name] = notes.GetNoteName(i);
-    array.push_back({{"pitch", pitch},
-                     {"name", name.string()},
-                     {"group", notes.GetNoteGroupForPitch(pitch)}});
+    array.push_back(
+        {{"pitch", pitch}, {"name", name.string()}, {"group", notes.GetNoteGroupForPitch(pitch)}});
   }
   return array;
 }
@@ -141,9 +140,8 @@ std::string ModesJSON(Destination const& destination) {
 }
 
 std::string BanksJSON(std::vector<PatchBank> const& banks) {
-  return BanksWith(banks, [](PatchBank const& bank, Json& json) {
-    json["patchCount"] = bank.CountPatches();
-  });
+  return BanksWith(
+      banks, [](PatchBank const& bank, Json& json) { json["patchCount"] = bank.CountPatches(); });
 }
 
 std::string PatchesJSON(std::vector<PatchBank> const& banks) {
@@ -167,7 +165,8 @@ std::string NoteJSON(int pitch, std::string const& name) {
 
 std::string NotesJSON(Patch const& patch) {
   NoteNameList const notes = patch.GetNoteNames();
-  return Dump({{"patch", PatchJson(patch)}, {"notes", NotesOf(notes)}, {"groups", GroupsOf(notes)}});
+  return Dump(
+      {{"patch", PatchJson(patch)}, {"notes", NotesOf(notes)}, {"groups", GroupsOf(notes)}});
 }
 
 std::string ControlsJSON(Patch const& patch) {

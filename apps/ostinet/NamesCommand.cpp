@@ -53,7 +53,7 @@ void ShowNames(GlobalOptions const& globals, NamesOptions const& options) {
   }
   PrintOne(globals.json, NamesJSON(destination), NamesLines(destination));
   if (isEdit) {
-    session.Save();
+    session.GetSetup().SignOut(true);
   }
 }
 
@@ -90,8 +90,9 @@ void ListCatalog(GlobalOptions const& globals, CatalogOptions const& options) {
 void AddNamesListCommand(CLI::App& names, CommandLine& line) {
   auto const options = std::make_shared<CatalogOptions>();
   CLI::App* const command = names.add_subcommand(
-      "list", "List what the name documents of this machine offer: standard modes, or the "
-              "documents of a maker's models");
+      "list",
+      "List what the name documents of this machine offer: standard modes, or the "
+      "documents of a maker's models");
   command->add_option("MAKER", options->maker, "Exactly as in the documents");
   command->add_option("MODEL", options->model, "Exactly as in the documents");
   command->callback(

@@ -48,7 +48,7 @@ void ChangeMode(GlobalOptions const& globals, ModeOptions const& options) {
   session.RunFor(kUntilSent);
   PrintOne(globals.json, ModesJSON(destination), ModesLines(destination));
   if (!isCurrent) {
-    session.Save();
+    session.GetSetup().SignOut(true);
   }
 }
 
@@ -67,8 +67,8 @@ void NameNote(GlobalOptions const& globals, NoteOptions const& options) {
   auto const pitch = static_cast<unsigned char>(ParseNote(options.note));
   Session session(globals, nullptr, nullptr);
   Destination const destination = FindAnyDestination(session.GetSetup(), options.destination);
-  Patch const patch = FindPatchToShow(destination, ChannelOf(options.channel), options.patch,
-                                      options.bank);
+  Patch const patch =
+      FindPatchToShow(destination, ChannelOf(options.channel), options.patch, options.bank);
   NoteNameList const notes = patch.GetNoteNames();
   bool const isEdit = options.clear || options.nameOption->count() > 0;
   if (options.clear) {
@@ -80,7 +80,7 @@ void NameNote(GlobalOptions const& globals, NoteOptions const& options) {
   PrintOne(globals.json, NoteJSON(pitch, name), {name});
   if (isEdit) {
     session.GetSetup().SaveEditedDestBanks();
-    session.Save();
+    session.GetSetup().SignOut(true);
   }
 }
 
@@ -97,8 +97,7 @@ void AddSelectCommand(CLI::App& app, CommandLine& line) {
   AddDestination(*command, options->destination);
   command->add_option("CHANNEL", options->channel, "1 to 16")->required();
   command->add_option("PATCH", options->patch, "Its number or name")->required();
-  command->add_option("--bank", options->bank, "Only in the bank of this name")
-      ->type_name("BANK");
+  command->add_option("--bank", options->bank, "Only in the bank of this name")->type_name("BANK");
   command->callback(
       [&line, options] { line.run = [&line, options] { Select(line.options, *options); }; });
 }
@@ -122,8 +121,7 @@ void AddNoteNameCommand(CLI::App& app, CommandLine& line) {
       ->required();
   options->nameOption = command->add_option("NAME", options->name, "The new name");
   command->add_flag("--clear", options->clear, "Take the name away");
-  command->add_option("--bank", options->bank, "Only in the bank of this name")
-      ->type_name("BANK");
+  command->add_option("--bank", options->bank, "Only in the bank of this name")->type_name("BANK");
   command->add_option("-c,--channel", options->channel, "1 to 16 (1)")->type_name("N");
   command->callback(
       [&line, options] { line.run = [&line, options] { NameNote(line.options, *options); }; });

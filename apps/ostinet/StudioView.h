@@ -8,7 +8,7 @@
 namespace Ostinet {
 class Destination;
 class Setup;
-}
+}  // namespace Ostinet
 
 namespace Ostinet::Tool {
 
@@ -74,8 +74,8 @@ struct StudioView {
 /// Looks at the whole studio. On the polling thread.
 StudioView ViewStudio(Setup const& setup);
 
-/// The patches that play on those channels of `channels`, bit 0 being channel 1, as far as they were
-/// selected through this program.
+/// The patches that play on those channels of `channels`, bit 0 being channel 1, as far as they
+/// were selected through this program.
 std::vector<PlayingView> ViewPlaying(Destination const& destination, unsigned short channels);
 /// Fills in what plays on every public destination.
 void AddPlaying(StudioView& view, Setup const& setup);

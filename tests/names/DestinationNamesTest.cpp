@@ -29,10 +29,10 @@ class DestinationNamesTest : public NamedStudioTest {
     SetDict(destination, dict);
   }
   File WriteTwo() const {
-    return folders.Write("user/Two.midnam",
-                         NameDocument(Master("Acme", "Two",
-                                             ModeWith("Other", "Set") +
-                                                 NameSetWith("Set", {"Preset", "Only"}))));
+    return folders.Write(
+        "user/Two.midnam",
+        NameDocument(Master("Acme", "Two",
+                            ModeWith("Other", "Set") + NameSetWith("Set", {"Preset", "Only"}))));
   }
 };
 
@@ -43,7 +43,7 @@ TEST_F(DestinationNamesTest, AreTheDefaultOnesForADeviceThatNobodyKnows) {
   EXPECT_TRUE(destination.GetMode(0).IsStandardMode());
   EXPECT_EQ(destination.GetNames(),
             Names(Names::kStandardModeNames, FileOf("system/Standard.midnam"), "Default Names"));
-  EXPECT_THAT(DictOf(destination).entries, IsEmpty());
+  EXPECT_TRUE(DictOf(destination).entries.empty());
 }
 
 TEST_F(DestinationNamesTest, AreThoseOfTheMasterDocumentOfItsModel) {
@@ -108,8 +108,8 @@ TEST_F(DestinationNamesTest, AChosenMasterStaysWhenTheModelChanges) {
 
 TEST_F(DestinationNamesTest, AnAutomaticMasterIsLookedForAnewAndLosesItsOverrides) {
   File const two = WriteTwo();
-  File const extra = folders.Write(
-      "user/Extra.midnam", NameDocument(Extender("Acme", "One", ListOf("list", "Mine"))));
+  File const extra = folders.Write("user/Extra.midnam",
+                                   NameDocument(Extender("Acme", "One", ListOf("list", "Mine"))));
   Destination const destination = MakeOne();
   destination.SetOverrideNames(BankOf(destination), Names(Names::kOverrideNames, extra, "list"));
   ASSERT_EQ(ConfigurationOf(destination).overrides.size(), 1U);
@@ -209,11 +209,11 @@ TEST_F(DestinationNamesTest, WithoutADocumentOfTheDefaultNamesThereAreNone) {
 }
 
 TEST_F(DestinationNamesTest, AMasterBringsTheStandardModesThatItSupports) {
-  folders.Write("user/Two.midnam",
-                NameDocument(Master("Acme", "Two",
-                                    "<SupportsStandardDeviceMode Name='General MIDI'/>" +
-                                        ModeWith("Own", "Own set") +
-                                        NameSetWith("Own set", {"Own bank"}))));
+  folders.Write(
+      "user/Two.midnam",
+      NameDocument(Master("Acme", "Two",
+                          "<SupportsStandardDeviceMode Name='General MIDI'/>" +
+                              ModeWith("Own", "Own set") + NameSetWith("Own set", {"Own bank"}))));
   Destination const destination = MakeNamed("Acme", "Two");
   ASSERT_EQ(destination.CountModes(), 2);
   EXPECT_EQ(destination.GetMode(0).GetName(), UString("Own"));
@@ -273,7 +273,7 @@ TEST_F(DestinationNamesTest, OldHandlesAnswerFromTheOldTree) {
 
 TEST_F(DestinationNamesTest, ChannelsOutOfRangeHaveNone) {
   Destination const destination = MakeOne();
-  for (short const channel : {-1, 16, 1000}) {
+  for (short const channel : std::initializer_list<short>{-1, 16, 1000}) {
     EXPECT_EQ(destination.GetCurrentNameSet(channel), DestinationNameSet::kNoDestinationNameSet);
     EXPECT_EQ(destination.GetCurrentPatch(channel), Patch::kNoPatch);
   }

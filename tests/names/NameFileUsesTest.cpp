@@ -20,17 +20,15 @@ class NameFileUsesTest : public NamedStudioTest {
   NameFileUsesTest() {
     lists = folders.Write("user/Lists.midnam",
                           NameDocument(Extender("Acme", "One", ListOf("first", "Mine"))));
-    folders.Write("user/Two.midnam",
-                  NameDocument(Master("Acme", "Two",
-                                      ModeWith("Other", "Set") +
-                                          NameSetWith("Set", {"Preset", "Only"}))));
+    folders.Write(
+        "user/Two.midnam",
+        NameDocument(Master("Acme", "Two",
+                            ModeWith("Other", "Set") + NameSetWith("Set", {"Preset", "Only"}))));
     setup.onLoad = [this] { LoadStudio(); };
   }
 
   int Draw(int count) { return std::uniform_int_distribution<int>(0, count - 1)(random); }
-  Destination AnyDestination() {
-    return setup.GetDestination(Draw(setup.CountDestinations()));
-  }
+  Destination AnyDestination() { return setup.GetDestination(Draw(setup.CountDestinations())); }
   PatchBank AnyBank(Destination const& destination) {
     DestinationNameSet const nameSet = destination.GetNameSet(0);
     return nameSet.CountBanks() > 0 ? nameSet.GetBank(Draw(nameSet.CountBanks())) : PatchBank();
@@ -42,7 +40,8 @@ class NameFileUsesTest : public NamedStudioTest {
   /// What the setup file would bring back.
   void SaveStudio() {
     saved.clear();
-    for (auto const* list : {&setup.GetStudio().destinations, &setup.GetStudio().privateDestinations}) {
+    for (auto const* list :
+         {&setup.GetStudio().destinations, &setup.GetStudio().privateDestinations}) {
       for (auto const& destination : *list) {
         saved.push_back(static_cast<TestPeer*>(destination->Peer())->OwnProperties());
       }
@@ -77,7 +76,8 @@ class NameFileUsesTest : public NamedStudioTest {
             Names(Names::kStandardModeNames, FileSpecification(), "General MIDI"));
       case 2:
         return destination.SetNames(destination.GetNames());
-      default:  // a document that another destination may use, and that the library may have written
+      default:  // a document that another destination may use, and that the library may have
+                // written
         return destination.SetNames(
             Names(Names::kMasterNames, ConfigurationOf(AnyDestination()).masterFile));
     }
@@ -157,7 +157,8 @@ class NameFileUsesTest : public NamedStudioTest {
   /// Those of them that some destination refers to.
   Files Used() {
     Files files;
-    for (auto const* list : {&setup.GetStudio().destinations, &setup.GetStudio().privateDestinations}) {
+    for (auto const* list :
+         {&setup.GetStudio().destinations, &setup.GetStudio().privateDestinations}) {
       for (auto const& destination : *list) {
         for (FileSpecification const& file : ConfigurationOf(Destination(destination)).GetFiles()) {
           if (Folder(OwnFolder()).GetFile(file.GetName()) == file) {

@@ -27,8 +27,9 @@ inline std::string ModeWith(std::string const& name, std::string const& nameSet)
 inline std::string NameSetWith(std::string const& name, std::vector<std::string> const& banks) {
   std::string content = "<ChannelNameSet Name='" + name + "'>";
   for (std::size_t i = 0; i < banks.size(); ++i) {
-    content += "<PatchBank Name='" + banks[i] + "'><MIDICommands><ControlChange Control='0' Value='" +
-               std::to_string(i) + "'/><ControlChange Control='32' Value='1'/></MIDICommands>" +
+    content += "<PatchBank Name='" + banks[i] +
+               "'><MIDICommands><ControlChange Control='0' Value='" + std::to_string(i) +
+               "'/><ControlChange Control='32' Value='1'/></MIDICommands>" +
                "<PatchNameList><Patch Number='1' Name='" + banks[i] +
                " 1' ProgramChange='0'/><Patch Number='2' Name='" + banks[i] +
                " 2' ProgramChange='1'/></PatchNameList></PatchBank>";
@@ -44,9 +45,9 @@ inline std::string ListOf(std::string const& name, std::string const& patch) {
 
 /// A studio whose destinations have names, with these documents:
 ///
-///   Acme One          modes "Normal" (name set "Main": banks "Preset", "User") and "Multi" ("Drums")
-///   Default Names     a standard mode with one bank "Numbers"
-///   General MIDI      a standard mode with one bank "GM"
+///   Acme One          modes "Normal" (name set "Main": banks "Preset", "User") and "Multi"
+///   ("Drums") Default Names     a standard mode with one bank "Numbers" General MIDI      a
+///   standard mode with one bank "GM"
 class NamedStudioTest : public StudioTest {
  protected:
   NamedStudioTest() {
@@ -104,9 +105,9 @@ class NamedStudioTest : public StudioTest {
   static void SetDict(Destination const& destination, Impl::PropertyDict const& dict) {
     TestSetup::PeerOf(destination).SetDict(Impl::Keys::kNameConfiguration, dict);
   }
-  /// Calls a note of the first patch of a bank something.
-  static void EditNote(PatchBank const& bank, UString const& name) {
-    bank.GetPatch(0).GetNoteNames().SetNoteName(60, name);
+  /// Calls a note of a patch something.
+  static void EditNote(PatchBank const& bank, UString const& name, int patch = 0) {
+    bank.GetPatch(patch).GetNoteNames().SetNoteName(60, name);
   }
   /// What went out to a port since the last call.
   static void Sent(Destination const& port, std::vector<unsigned char> const& bytes) {

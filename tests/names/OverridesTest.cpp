@@ -13,9 +13,9 @@ class OverridesTest : public NamedStudioTest {
  protected:
   /// Lists "first" and "second", of one patch each.
   File WriteLists(char const* path = "user/Lists.midnam") const {
-    return folders.Write(path, NameDocument(Extender("Acme", "One",
-                                                     ListOf("first", "Mine") +
-                                                         ListOf("second", "Yours"))));
+    return folders.Write(
+        path,
+        NameDocument(Extender("Acme", "One", ListOf("first", "Mine") + ListOf("second", "Yours"))));
   }
   static UString FirstPatch(Destination const& destination, int bank) {
     return BankOf(destination, bank).GetPatch(0).GetName();
@@ -55,7 +55,8 @@ TEST_F(OverridesTest, ABankTakesItsPatchesFromAnotherDocument) {
 TEST_F(OverridesTest, AreStoredAndReadBack) {
   File const lists = WriteLists();
   Destination const destination = MakeOne();
-  destination.SetOverrideNames(BankOf(destination, 0), Names(Names::kOverrideNames, lists, "first"));
+  destination.SetOverrideNames(BankOf(destination, 0),
+                               Names(Names::kOverrideNames, lists, "first"));
   destination.SetOverrideNames(BankOf(destination, 1),
                                Names(Names::kOverrideNames, lists, "second"));
   EXPECT_EQ(NameConfiguration::Read(TestSetup::PeerOf(destination)), ConfigurationOf(destination));
@@ -88,11 +89,10 @@ TEST_F(OverridesTest, ANullBankIsNoBank) {
 }
 
 TEST_F(OverridesTest, OnDefaultNamesTheyStandBesideADocumentOfOurs) {
-  File const lists = folders.Write("user/L.midnam",
-                                   NameDocument("<ExtendingDeviceNames><Device Name='x' UniqueID='" +
-                                                std::to_string(MakeNamed().GetUniqueID() + 1) +
-                                                "'/>" + ListOf("first", "Mine") +
-                                                "</ExtendingDeviceNames>"));
+  File const lists = folders.Write(
+      "user/L.midnam", NameDocument("<ExtendingDeviceNames><Device Name='x' UniqueID='" +
+                                    std::to_string(MakeNamed().GetUniqueID() + 1) + "'/>" +
+                                    ListOf("first", "Mine") + "</ExtendingDeviceNames>"));
   Destination const destination = MakeNamed();
   destination.SetOverrideNames(BankOf(destination), Names(Names::kOverrideNames, lists, "first"));
   EXPECT_EQ(ConfigurationOf(destination).kind, NameConfiguration::kAutomaticMaster);
@@ -126,19 +126,36 @@ TEST_F(OverridesTest, EditsOfDefaultNamesBringAMasterToo) {
   EXPECT_EQ(destination.GetNames().GetName(), UString("Default Names"));
 }
 
+// A patch marks its bank at its first edit after a load only, so each save here needs another one.
 TEST_F(OverridesTest, EachSaveReplacesTheDocumentBefore) {
   Destination const destination = MakeOne();
   EditNote(BankOf(destination, 0), "Bell");
   EditNote(BankOf(destination, 1), "Bell");
   setup.SaveEditedDestBanks();
-  EditNote(BankOf(destination, 0), "Gong");
+  EditNote(BankOf(destination, 0), "Gong", 1);
   setup.SaveEditedDestBanks();
   EXPECT_THAT(WrittenDocuments(), ElementsAre("Synth 2.midnam", "Synth.midnam"));
-  EditNote(BankOf(destination, 1), "Gong");
+  EditNote(BankOf(destination, 1), "Gong", 1);
   setup.SaveEditedDestBanks();
   EXPECT_THAT(WrittenDocuments(), ElementsAre("Synth 2.midnam", "Synth 3.midnam"));
   setup.SaveEditedDestBanks();
   EXPECT_THAT(WrittenDocuments(), ElementsAre("Synth 2.midnam", "Synth 3.midnam"));
+}
+
+// Hosts count on a save writing just what they marked: the list of a patch that was edited before
+// stays open, and what goes into it later is written with the bank's next mark.
+TEST_F(OverridesTest, ASecondEditOfAPatchWaitsForAnotherMarkOfItsBank) {
+  Destination const destination = MakeOne();
+  EditNote(BankOf(destination), "Bell");
+  setup.SaveEditedDestBanks();
+  EditNote(BankOf(destination), "Gong");
+  setup.SaveEditedDestBanks();
+  EXPECT_THAT(WrittenDocuments(), ElementsAre("Synth.midnam"));
+  EditNote(BankOf(destination), "Other", 1);
+  setup.SaveEditedDestBanks();
+  folders.Touch("user/One.midnam");
+  Renew(destination);
+  EXPECT_EQ(NoteOf(BankOf(destination)), UString("Gong"));
 }
 
 TEST_F(OverridesTest, AnOverrideSavesTheEditsOfTheOtherBanksAndDropsItsOwn) {
@@ -146,7 +163,8 @@ TEST_F(OverridesTest, AnOverrideSavesTheEditsOfTheOtherBanksAndDropsItsOwn) {
   Destination const destination = MakeOne();
   EditNote(BankOf(destination, 0), "Bell");
   EditNote(BankOf(destination, 1), "Gong");
-  destination.SetOverrideNames(BankOf(destination, 0), Names(Names::kOverrideNames, lists, "first"));
+  destination.SetOverrideNames(BankOf(destination, 0),
+                               Names(Names::kOverrideNames, lists, "first"));
   EXPECT_EQ(FirstPatch(destination, 0), UString("Mine"));
   EXPECT_EQ(NoteOf(BankOf(destination, 0)), UString());
   EXPECT_EQ(NoteOf(BankOf(destination, 1)), UString("Gong"));
@@ -157,7 +175,8 @@ TEST_F(OverridesTest, AnOverrideByWhatItAlreadyIsDeletesNothing) {
   Destination const destination = MakeOne();
   EditNote(BankOf(destination), "Bell");
   setup.SaveEditedDestBanks();
-  destination.SetOverrideNames(BankOf(destination), destination.GetOverrideNames(BankOf(destination)));
+  destination.SetOverrideNames(BankOf(destination),
+                               destination.GetOverrideNames(BankOf(destination)));
   EXPECT_THAT(WrittenDocuments(), ElementsAre("Synth.midnam"));
   EXPECT_EQ(NoteOf(BankOf(destination)), UString("Bell"));
   destination.SetNames(Names(Names::kStandardModeNames, FileSpecification(), "General MIDI"));
