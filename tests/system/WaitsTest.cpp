@@ -119,9 +119,16 @@ TEST(SystemWaitsThreads, ErrorsBelongToTheirThread) {
   auto const waits = MakeSystemWaits();
   HANDLE const semaphore = waits->CreateSemaphoreW(1, 1);
   EXPECT_FALSE(waits->ReleaseSemaphore(semaphore, 1));
-  std::thread other([&] { waits->CloseHandle(nullptr); });
-  other.join();
+  // Joining a thread may itself set this thread's error, so that is done last.
+  std::atomic<bool> hasFailed{false};
+  std::thread other([&] {
+    waits->CloseHandle(nullptr);
+    hasFailed = true;
+  });
+  while (!hasFailed) {
+  }
   EXPECT_EQ(waits->GetLastError(), 298u);
+  other.join();
   waits->CloseHandle(semaphore);
 }
 
