@@ -27,6 +27,7 @@ void AddPanicCommand(CLI::App& app, CommandLine& line);
 void AddRefCommand(CLI::App& app, CommandLine& line);
 void AddResolveCommand(CLI::App& app, CommandLine& line);
 void AddPairCommand(CLI::App& app, CommandLine& line);
+void AddTypesCommand(CLI::App& app, CommandLine& line);
 
 /// Adds --for and --count.
 void AddLimits(CLI::App& command, Limits& limits);
