@@ -118,13 +118,17 @@ TEST(SystemWaitsThreads, ATimerThatIsSetEarlierWakesItsWaiter) {
 TEST(SystemWaitsThreads, ErrorsBelongToTheirThread) {
   auto const waits = MakeSystemWaits();
   HANDLE const semaphore = waits->CreateSemaphoreW(1, 1);
-  EXPECT_FALSE(waits->ReleaseSemaphore(semaphore, 1));
-  // Joining a thread may itself set this thread's error, so that is done last.
+  // Making or joining a thread may itself set this thread's error: neither happens in between.
+  std::atomic<bool> mayFail{false};
   std::atomic<bool> hasFailed{false};
   std::thread other([&] {
+    while (!mayFail) {
+    }
     waits->CloseHandle(nullptr);
     hasFailed = true;
   });
+  EXPECT_FALSE(waits->ReleaseSemaphore(semaphore, 1));
+  mayFail = true;
   while (!hasFailed) {
   }
   EXPECT_EQ(waits->GetLastError(), 298u);
