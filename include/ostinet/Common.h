@@ -143,6 +143,11 @@ extern template class OSTINET_EXPORT RCPtrMT<Impl::DeviceTypeInfoImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::AutodetectRequestImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::AutodetectResponseImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::SysexImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::DestModeImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::DestNameSetImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::PatchBankImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::PatchImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::ValueListImpl>;
 
 /// Facts about the MIDI backend that is in use.
 ///

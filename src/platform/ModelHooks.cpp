@@ -89,6 +89,7 @@ void WinMIDISetup::PlatformSetEntityDestinations(RCPtrMT<EntityImpl>& entity, in
     entity->AddDestination(destination);
     Lists().destinations.push_back(destination);
     MaybeAssignUniqueID(*destination);
+    destination->RenewNewNames();
   }
   while (entity->GetDestinations().size() > wanted) {
     RemoveDestination(entity->GetDestinations().back());
