@@ -26,6 +26,10 @@ option(OSTINET_WARNINGS_AS_ERRORS "Treat warnings as errors" ${PROJECT_IS_TOP_LE
 option(OSTINET_PRECOMPILE "Precompile headers for the library too, which saves time" OFF)
 set(OSTINET_SANITIZE "" CACHE STRING "Value for -fsanitize=, empty for none")
 
+# Documents of real instruments, which are no part of the tree.
+set(OSTINET_NAME_CORPUS "${PROJECT_SOURCE_DIR}/../shared/corpus/midnam" CACHE PATH
+  "Folder of name documents that tests and benchmarks read, where it is there")
+
 find_program(CCACHE_PROGRAM ccache)
 if(CCACHE_PROGRAM AND NOT CMAKE_CXX_COMPILER_LAUNCHER)
   # Paths are told relative to the tree, so that clones share what they compiled, and precompiled

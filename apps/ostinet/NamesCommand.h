@@ -5,7 +5,10 @@
 
 namespace Ostinet::Tool {
 
-// The subcommands of `names`, each with its options and its help; they set `run` where given.
+// What `names` does by itself, with a destination, and its subcommands, each with its options and
+// its help; they set `run` where given.
+void AddNamesOfDestination(CLI::App& names, CommandLine& line);
+void AddNamesList(CLI::App& names, CommandLine& line);
 void AddNamesShow(CLI::App& names, CommandLine& line);
 void AddNamesCheck(CLI::App& names, CommandLine& line);
 
