@@ -65,5 +65,6 @@ int AlreadyExistsError();
 int RenameOver(std::filesystem::path const& from, std::filesystem::path const& to);
 /// A number that no other running process has.
 unsigned long ProcessNumber();
+bool IsErrorOutputATerminal();
 
 }  // namespace Ostinet::SystemServices

@@ -159,4 +159,6 @@ int RenameOver(std::filesystem::path const& from, std::filesystem::path const& t
 
 unsigned long ProcessNumber() { return static_cast<unsigned long>(::getpid()); }
 
+bool IsErrorOutputATerminal() { return ::isatty(STDERR_FILENO) == 1; }
+
 }  // namespace Ostinet::SystemServices

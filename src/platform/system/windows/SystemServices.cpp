@@ -142,4 +142,9 @@ int RenameOver(std::filesystem::path const& from, std::filesystem::path const& t
 
 unsigned long ProcessNumber() { return ::GetCurrentProcessId(); }
 
+bool IsErrorOutputATerminal() {
+  DWORD mode = 0;
+  return ::GetConsoleMode(::GetStdHandle(STD_ERROR_HANDLE), &mode) != 0;
+}
+
 }  // namespace Ostinet::SystemServices
