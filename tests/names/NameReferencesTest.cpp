@@ -12,8 +12,8 @@ void ExpectAReference(Handle const& handle, int type) {
   EXPECT_EQ(reference.GetObjectType(), type);
   EXPECT_EQ(reference.GetObjectName(), handle.GetName());
   EXPECT_FALSE(reference.ObjectIsSoftware());
-  // 32 bytes, and two for each unit of the name.
-  EXPECT_EQ(reference.size(), 32 + 2 * handle.GetName().length());
+  // 32 bytes, two empty texts and three flags, and two for each unit of the name.
+  EXPECT_EQ(reference.size(), 43 + 2 * handle.GetName().length());
 }
 
 // Hosts keep these bytes in their documents, so the tags never change. Banks and patches have one.
