@@ -48,6 +48,9 @@ target_compile_options(ostinet_settings INTERFACE
   $<$<AND:$<CXX_COMPILER_ID:GNU>,$<VERSION_LESS:$<CXX_COMPILER_VERSION>,13>>:-Wno-restrict>
   # Optimising, GCC 12 takes the small buffers of boost::function and std::optional for unset.
   $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>
+  # Nor does it know that the distance between two ends of a vector is never negative.
+  $<$<AND:$<CXX_COMPILER_ID:GNU>,$<NOT:$<CONFIG:Debug>>>:-Wno-stringop-overread>
+  $<$<AND:$<CXX_COMPILER_ID:GNU>,$<NOT:$<CONFIG:Debug>>>:-Wno-stringop-overflow>
   # Without a time in them, precompiled headers made anew are the same to the compiler cache.
   "$<$<CXX_COMPILER_ID:Clang>:SHELL:-Xclang -fno-pch-timestamp>"
   $<$<BOOL:${OSTINET_WARNINGS_AS_ERRORS}>:-Werror>)
