@@ -9,7 +9,9 @@
 #if defined(__has_feature)
 #if __has_feature(thread_sanitizer)
 #define OSTINET_HOOKED_ALLOCATOR 1
-#include <sanitizer/allocator_interface.h>
+extern "C" int __sanitizer_install_malloc_and_free_hooks(void (*onMalloc)(void const volatile*,
+                                                                          std::size_t),
+                                                         void (*onFree)(void const volatile*));
 #endif
 #endif
 
