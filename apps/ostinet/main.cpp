@@ -66,8 +66,10 @@ int Main(int argc, char** argv) {
   CommandLine line;
   Describe(app);
   AddGlobals(app, line.options);
-  for (auto const add : {AddListCommand, AddWatchCommand, AddMonitorCommand, AddSendCommand,
-                         AddPanicCommand, AddRefCommand, AddResolveCommand, AddPairCommand}) {
+  for (auto const add :
+       {AddListCommand, AddWatchCommand, AddMonitorCommand, AddSendCommand, AddPanicCommand,
+        AddRefCommand, AddResolveCommand, AddPairCommand, AddDeviceCommand, AddEntityCommand,
+        AddConnectCommand, AddDisconnectCommand, AddVirtualCommand, AddDrawCommand}) {
     add(app, line);
   }
   try {
