@@ -33,6 +33,7 @@ void AddConnectCommand(CLI::App& app, CommandLine& line);
 void AddDisconnectCommand(CLI::App& app, CommandLine& line);
 void AddVirtualCommand(CLI::App& app, CommandLine& line);
 void AddDrawCommand(CLI::App& app, CommandLine& line);
+void AddTypesCommand(CLI::App& app, CommandLine& line);
 
 /// Adds --for and --count.
 void AddLimits(CLI::App& command, Limits& limits);

@@ -36,8 +36,11 @@ constexpr Fits kWaysToFit[] = {IsExactly, IsButForCase, BeginsWith, Holds};
 std::string Listed(std::vector<Candidate> const& candidates, std::vector<size_t> const& places) {
   std::string text;
   for (size_t const place : places) {
-    text += (text.empty() ? "\"" : ", \"") + candidates[place].name + "\" (#" +
-            std::to_string(candidates[place].uniqueID) + ")";
+    Candidate const& candidate = candidates[place];
+    text += (text.empty() ? "\"" : ", \"") + candidate.name + "\"";
+    if (candidate.uniqueID != 0) {
+      text += " (#" + std::to_string(candidate.uniqueID) + ")";
+    }
   }
   return text;
 }
@@ -68,7 +71,8 @@ std::vector<size_t> FindByName(std::vector<Candidate> const& candidates, UString
 std::vector<size_t> FindByID(std::vector<Candidate> const& candidates, std::string const& wanted) {
   std::vector<size_t> found;
   for (size_t i = 0; i < candidates.size(); ++i) {
-    if (wanted == "#" + std::to_string(candidates[i].uniqueID)) {
+    int const id = candidates[i].uniqueID;
+    if (id != 0 && wanted == "#" + std::to_string(id)) {
       found.push_back(i);
     }
   }

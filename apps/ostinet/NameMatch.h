@@ -11,7 +11,7 @@ namespace Ostinet::Tool {
 /// Something that a user can name.
 struct Candidate {
   std::string name;  ///< UTF-8
-  int uniqueID;
+  int uniqueID;      ///< 0 for what has none
 };
 
 /// The place of the candidate that `wanted` means: the one of exactly this name, else the one whose

@@ -66,10 +66,10 @@ int Main(int argc, char** argv) {
   CommandLine line;
   Describe(app);
   AddGlobals(app, line.options);
-  for (auto const add :
-       {AddListCommand, AddWatchCommand, AddMonitorCommand, AddSendCommand, AddPanicCommand,
-        AddRefCommand, AddResolveCommand, AddPairCommand, AddDeviceCommand, AddEntityCommand,
-        AddConnectCommand, AddDisconnectCommand, AddVirtualCommand, AddDrawCommand}) {
+  for (auto const add : {AddListCommand, AddWatchCommand, AddMonitorCommand, AddSendCommand,
+                         AddPanicCommand, AddRefCommand, AddResolveCommand, AddPairCommand,
+                         AddTypesCommand, AddDeviceCommand, AddEntityCommand, AddConnectCommand,
+                         AddDisconnectCommand, AddVirtualCommand, AddDrawCommand}) {
     add(app, line);
   }
   try {

@@ -139,7 +139,15 @@ extern template class OSTINET_EXPORT RCPtrMT<Impl::DeviceImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::EntityImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::EndpointImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::DestinationImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::DeviceTypeInfoImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::AutodetectRequestImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::AutodetectResponseImpl>;
 extern template class OSTINET_EXPORT RCPtrMT<Impl::SysexImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::DestModeImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::DestNameSetImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::PatchBankImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::PatchImpl>;
+extern template class OSTINET_EXPORT RCPtrMT<Impl::ValueListImpl>;
 
 /// Facts about the MIDI backend that is in use.
 ///

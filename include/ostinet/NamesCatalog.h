@@ -13,6 +13,10 @@
 
 namespace Ostinet {
 
+namespace Impl {
+struct ControlParts;
+}
+
 /// What selects a patch: program, and bank by its coarse and fine half. 255 means none.
 struct OSTINET_EXPORT PatchNumbers {
   unsigned char program, msb, lsb;
@@ -42,20 +46,48 @@ class OSTINET_EXPORT Names {
   UString const& GetName() const;
   bool operator==(Names const&) const;
   bool operator!=(Names const&) const;
+
+ private:
+  Type type_;
+  FileSpecification file_;
+  UString name_;
 };
 
-/// The name documents of this machine.
+/// The name documents of this machine: those in the folders for device files of the user and of
+/// the machine, whose names end in ".midnam".
 ///
-/// Ownership    One object, which lives to the end of the process.
+/// The folders are walked at most once a minute, and a document is opened only if it is new or its
+/// date changed since it was last looked at, also in an earlier session.
+///
+/// Ownership    One object, made by the first call of Instance, which lives to the end of the
+///              process. It needs no sign-in.
 /// Threads      Instance: [any thread]; the rest the host's polling thread.
+/// Errors       A document that is malformed throws a VantorError out of the search that first
+///              looks at it; the next search tries it again. Nothing found is no error.
 class OSTINET_EXPORT NamesCatalog {
  public:
   static NamesCatalog& Instance();
+  NamesCatalog(NamesCatalog const&) = delete;
+  NamesCatalog& operator=(NamesCatalog const&) = delete;
+
+  /// The document with the names of a model, of kMasterNames, or no names. Both texts are compared
+  /// exactly. A document that the manufacturer itself wrote comes before all others.
   Names FindMaster(UString const& manufacturer, UString const& model);
+  /// Appends every such document, in the order of the walk: the user's first.
   void FindMasters(UString const& manufacturer, UString const& model, std::vector<Names>& out);
+  /// Appends every patch list that a document offers for the banks of a model, of kOverrideNames;
+  /// GetName is the list's name.
   void FindOverrides(UString const& manufacturer, UString const& model, std::vector<Names>& out);
+  /// The first document that defines the standard mode `name`, as "General MIDI", of
+  /// kStandardModeNames; or no names.
   Names FindStandardMode(UString const& name);
+  /// Appends each standard mode that some document defines, once.
   void FindStandardModes(std::vector<Names>& out);
+
+ private:
+  NamesCatalog();
+
+  Impl::NamesCatalogImpl* const impl_;  // lives as long as this
 };
 
 class NoteNameList;
@@ -198,7 +230,12 @@ class OSTINET_EXPORT DefaultNoteNameList : public NoteNameListBase {
 };
 
 /// Which kind of message a control is.
-enum ControlType : int {};
+enum ControlType : int {
+  kControl7Bit = 0,   ///< a control change
+  kControl14Bit = 1,  ///< a pair of control changes
+  kControlRPN = 2,    ///< a registered parameter
+  kControlNRPN = 3,   ///< a parameter of the maker's own
+};
 
 /// One control of a patch: its number, its name, its range.
 ///
@@ -229,6 +266,20 @@ class OSTINET_EXPORT Control {
   int CountValueNames() const;
   std::pair<unsigned short, UString> GetValueName(int) const;
   UString GetNameForValue(unsigned short) const;
+
+ private:
+  friend struct Impl::ControlParts;
+
+  ControlType type_ = ControlType();
+  unsigned short number_ = 0;
+  bool hasValueRange_ = false;
+  bool hasDefaultValue_ = false;
+  double min_ = 0.0;
+  double max_ = 0.0;
+  double defaultValue_ = 0.0;
+  UString name_;
+  UString units_;
+  RCPtrMT<Impl::ValueListImpl> valueNames_;
 };
 
 /// What the controls of a patch are called.

@@ -199,7 +199,9 @@ class OSTINET_EXPORT Setup : private Noncopyable<Setup> {
   void DeleteVirtualEndpoint(Endpoint const& endpoint);
   /// Forgets a port that is not there any more.
   void DeleteBareEndpoint(Endpoint const& endpoint);
-  /// Writes the edited names of all destinations. Once a minute the library does it by itself.
+  /// Writes the edited names of all destinations. Throws a VantorError if the host has no folder
+  /// or the disk refuses; the edits stay then. Once a minute, and at sign-out, the library does it
+  /// by itself, and tries again later where it cannot.
   void SaveEditedDestBanks();
 
   /// Destinations of the host's plug-in engine.
@@ -288,6 +290,11 @@ class OSTINET_EXPORT Setup : private Noncopyable<Setup> {
 
  private:
   friend class WithSetupChangesCompleteAndDeferred;
+  friend class Impl::DestinationImpl;
+
+  void LoadNamesCatalog();
+  void SaveNamesCatalog();
+  void TrySavingEditedBanks();
 
   struct State;
   std::unique_ptr<State> const state_;

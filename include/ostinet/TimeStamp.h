@@ -83,6 +83,8 @@ class OSTINET_EXPORT DataBuffer {
   /// Appends a packet with a copy of `length` bytes; null `bytes` make an empty packet. The bytes
   /// may be those of a packet of this buffer.
   void Add(TimeStamp const& stamp, unsigned char const* bytes, size_t length);
+  /// Makes the last packet longer by one byte; does nothing where there is no packet.
+  void AppendByte(unsigned char byte);
 
   bool empty() const { return entries_.empty(); }
   /// The count of packets.

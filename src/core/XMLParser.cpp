@@ -46,6 +46,16 @@ class OpenElement {
   Name const& GetName() const { return name_; }
   int Line() const { return line_; }
 
+  std::vector<Name> AttributeNames() const {
+    std::vector<Name> names;
+    std::size_t start = 0;
+    for (std::size_t i = 0; i + 1 < ends_.size(); i += 2) {
+      names.emplace_back(std::string(View(start, ends_[i])));
+      start = ends_[i + 1];
+    }
+    return names;
+  }
+
   bool FindAttribute(Name const& name, UString& value) const {
     std::size_t start = 0;
     for (std::size_t i = 0; i + 1 < ends_.size(); i += 2) {
@@ -203,6 +213,11 @@ Name const& Parser::CurrentElement() const {
 int Parser::CurrentLine() const {
   OpenElement const* const current = cursor_->Current();
   return current == nullptr ? 1 : current->Line();
+}
+
+std::vector<Name> Parser::AttributeNames() const {
+  OpenElement const* const current = cursor_->Current();
+  return current == nullptr ? std::vector<Name>() : current->AttributeNames();
 }
 
 bool Parser::ReadAttribute(Name const& name, UString& value) const {

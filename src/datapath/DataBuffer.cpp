@@ -31,6 +31,13 @@ void DataBuffer::Add(TimeStamp const& stamp, unsigned char const* bytes, size_t 
   std::copy(from, from + length, bytes_.begin() + static_cast<std::ptrdiff_t>(offset));
 }
 
+void DataBuffer::AppendByte(unsigned char byte) {
+  if (!entries_.empty()) {
+    bytes_.push_back(byte);
+    ++entries_.back().length;
+  }
+}
+
 DataPacket DataBuffer::operator[](size_t index) const {
   if (index >= entries_.size()) {
     return DataPacket();

@@ -3,6 +3,7 @@
 
 #include <utility>
 
+#include "model/NamesHooks.h"
 #include "model/PropertyKeys.h"
 #include "ostinet/Setup.h"
 
@@ -13,6 +14,9 @@ DestinationImpl::DestinationImpl(std::unique_ptr<ImplImpl> peer, Setup& setup,
     : EndpointImpl(std::move(peer), setup, kind, true) {
   if (IsDirect()) {
     channelState_ = new ChannelPatchState;
+  }
+  if (NamesHooks const* const hooks = GetNamesHooks()) {
+    names_ = hooks->MakeNames(*this);
   }
 }
 
@@ -39,6 +43,14 @@ void DestinationImpl::RenewNames() {
     listener->DestinationNamesChanged(RCPtrMT<DestinationImpl>(this), kAllChannels);
   }
 }
+
+void DestinationImpl::RenewNewNames() {
+  if (names_ != nullptr) {
+    names_->Renew();
+  }
+}
+
+NameFileStore* DestinationImpl::GetNameFileStore() const { return GetSetup().GetNameFileStore(); }
 
 MatchObjectID DestinationImpl::GetObjectID() const { return Destination::kObjectID; }
 

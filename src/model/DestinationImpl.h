@@ -6,6 +6,8 @@
 
 namespace Ostinet::Impl {
 
+class NameFileStore;
+
 /// What a destination's patches are called: the side of a destination that knows documents. The
 /// destination tells it what happens; it does the rest.
 class DestinationNames {
@@ -38,6 +40,10 @@ class DestinationImpl : public EndpointImpl {
   void SetNames(std::unique_ptr<DestinationNames> names) { names_ = std::move(names); }
   /// Renews the names, and tells the listener if they changed.
   void RenewNames();
+  /// The same for a destination that the host does not know yet: it will hear of it as a whole.
+  void RenewNewNames();
+  /// The written name documents in use; null while signed out.
+  NameFileStore* GetNameFileStore() const;
 
  private:
   RCPtrMT<ChannelPatchState> channelState_;

@@ -11,6 +11,8 @@
 
 #include <cstdint>
 
+#include "model/ObjectImpl.h"
+#include "model/PrefsBlock.h"
 #include "ostinet/Setup.h"
 #include "ostinet/core/Error.h"
 
@@ -20,58 +22,12 @@ namespace {
 
 constexpr int kBlockID = 0;
 constexpr std::uint32_t kBlockVersion = 1;
-constexpr int kEndOfFile = -39;
+constexpr char const* kFolderName = "MIDINameDocuments";
+constexpr std::uint32_t kTextFileType = 0x54455854;     // "TEXT"
+constexpr std::uint32_t kTextFileCreator = 0x74747874;  // "ttxt"
+constexpr int kNoSuchFolder = -43;
 
 using Bytes = std::vector<unsigned char>;
-
-class BlockReader {
- public:
-  explicit BlockReader(Bytes const& bytes) : bytes_(bytes) {}
-
-  std::uint32_t ReadNumber() {
-    Demand(4);
-    std::uint32_t number = 0;
-    for (unsigned shift = 0; shift < 32; shift += 8) {
-      number |= static_cast<std::uint32_t>(bytes_[position_++]) << shift;
-    }
-    return number;
-  }
-
-  UString ReadText() {
-    std::size_t const length = ReadNumber();
-    Demand(length * 2);
-    std::u16string units;
-    units.reserve(length);
-    for (std::size_t i = 0; i < length; ++i, position_ += 2) {
-      units.push_back(static_cast<char16_t>(bytes_[position_] | bytes_[position_ + 1] << 8));
-    }
-    return UString(units);
-  }
-
- private:
-  void Demand(std::size_t count) const {
-    if (bytes_.size() - position_ < count) {
-      FailOSErr(kEndOfFile);
-    }
-  }
-
-  Bytes const& bytes_;
-  std::size_t position_ = 0;
-};
-
-void WriteNumber(Bytes& bytes, std::uint32_t number) {
-  for (unsigned shift = 0; shift < 32; shift += 8) {
-    bytes.push_back(static_cast<unsigned char>(number >> shift));
-  }
-}
-
-void WriteText(Bytes& bytes, UString const& text) {
-  WriteNumber(bytes, static_cast<std::uint32_t>(text.length()));
-  for (char16_t const unit : text) {
-    bytes.push_back(static_cast<unsigned char>(unit));
-    bytes.push_back(static_cast<unsigned char>(unit >> 8));
-  }
-}
 
 void DeleteFile(FileSpecification const& file) {
   try {
@@ -94,7 +50,7 @@ void NameFileStore::Load() {
   Bytes bytes;
   prefs_->Load(kBlockID, bytes);
   try {
-    BlockReader reader(bytes);
+    PrefsBlockReader reader(bytes);
     if (reader.ReadNumber() != kBlockVersion) {
       return;
     }
@@ -112,13 +68,26 @@ void NameFileStore::Save() const {
   if (prefs_ == nullptr || !isLoaded_) {
     return;
   }
-  Bytes bytes;
-  WriteNumber(bytes, kBlockVersion);
-  WriteNumber(bytes, static_cast<std::uint32_t>(inUse_.size()));
+  PrefsBlockWriter writer;
+  writer.WriteNumber(kBlockVersion);
+  writer.WriteNumber(static_cast<std::uint32_t>(inUse_.size()));
   for (auto const& [file, use] : inUse_) {
-    WriteText(bytes, file.GetFullPath());
+    writer.WriteText(file.GetFullPath());
   }
-  prefs_->Save(kBlockID, bytes);
+  prefs_->Save(kBlockID, writer.GetBytes());
+}
+
+void NameFileStore::CreateFile(File& out, ObjectImpl const& object) const {
+  Folder settings;
+  if (prefs_ != nullptr) {
+    prefs_->GetFolder(settings);
+  }
+  if (!settings.IsValid()) {
+    FailOSErr(kNoSuchFolder);
+  }
+  out = settings.DemandSubFolder(kFolderName)
+            .CreateFileInFolder(object.GetName() + ".midnam", kTextFileType, kTextFileCreator,
+                                Folder::kAdjustName);
 }
 
 void NameFileStore::DeleteWaiting() {

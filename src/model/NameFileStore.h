@@ -13,6 +13,8 @@ class PrefsHandler;
 
 namespace Ostinet::Impl {
 
+class ObjectImpl;
+
 /// Counts who uses each name document that the library itself wrote, and deletes one that nobody
 /// needs any more. A document that was in use at sign-out waits at the next sign-in; if nobody
 /// claims it there, it is deleted at the sign-out after.
@@ -33,6 +35,10 @@ class NameFileStore {
   /// Deletes the files that wait.
   void DeleteWaiting();
 
+  /// Makes a new, empty document in the folder "MIDINameDocuments" of the host's, named after a
+  /// destination; a name that is taken gets a number. It counts only once it is used. Throws a
+  /// VantorError where the host has no folder, or the disk refuses.
+  void CreateFile(File& out, ObjectImpl const& object) const;
   /// `count` more uses of a file, known or not.
   void AddUses(FileSpecification const& file, int count);
   /// One more use of a file that is in use or waits; nothing for any other.

@@ -5,6 +5,7 @@
 
 #include <utility>
 
+#include "model/NamesHooks.h"
 #include "model/SetupState.h"
 
 namespace Ostinet {
@@ -34,12 +35,28 @@ Setup::SignInResult Setup::SignIn(UString const& name, Receiver* receiver, Prefs
     return static_cast<SignInResult>(result);
   }
   state_->nameFileStore->Load();
+  LoadNamesCatalog();
   PlatformLoadSetup();
   UpdateConnections();
   if (state_->listener != nullptr) {
     state_->listener->SetupChanged();
   }
   return kSignInOK;
+}
+
+void Setup::LoadNamesCatalog() {
+  Impl::NamesHooks const* const hooks = Impl::GetNamesHooks();
+  if (state_->prefs != nullptr && hooks != nullptr) {
+    hooks->LoadCatalog(*state_->prefs);
+    state_->isCatalogLoaded = true;
+  }
+}
+
+// Only what was loaded: the host's handler outlives the session, but maybe no second sign-out.
+void Setup::SaveNamesCatalog() {
+  if (std::exchange(state_->isCatalogLoaded, false)) {
+    Impl::GetNamesHooks()->SaveCatalog(*state_->prefs);
+  }
 }
 
 namespace {
@@ -56,11 +73,12 @@ void DeactivateAll(List& list) {
 }  // namespace
 
 void Setup::SignOut(bool save) {
-  SaveEditedDestBanks();
+  TrySavingEditedBanks();
   if (std::unique_ptr<Impl::NameFileStore> const store = std::move(state_->nameFileStore)) {
     store->DeleteWaiting();
     store->Save();
   }
+  SaveNamesCatalog();
   if (save) {
     SaveDevices();
   }

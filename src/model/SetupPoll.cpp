@@ -3,9 +3,11 @@
 // Setup: what happens at the host's regular calls. Its callbacks may create and delete objects,
 // so every list is walked over a copy.
 #include <array>
+#include <exception>
 #include <vector>
 
 #include "model/SetupState.h"
+#include "ostinet/core/Error.h"
 
 namespace Ostinet {
 
@@ -68,7 +70,7 @@ void Setup::PollSetupChanges() {
   constexpr int kRoundsPerSave = 30;  // once a minute at PollSetupChangesInterval
   if (++state_->changesPollCount >= kRoundsPerSave) {
     state_->changesPollCount = 0;
-    SaveEditedDestBanks();
+    TrySavingEditedBanks();
   }
 }
 
@@ -79,13 +81,29 @@ void Setup::Suspend() {}
 void Setup::Resume() {}
 
 void Setup::SaveEditedDestBanks() {
+  std::exception_ptr firstFailure;
   for (Destinations const* list : {&GetStudio().destinations, &GetStudio().privateDestinations}) {
     Destinations const destinations = *list;
     for (RCPtrMT<Impl::DestinationImpl> const& destination : destinations) {
       if (Impl::DestinationNames* const names = destination->GetNames()) {
-        names->SaveEditedBanks();
+        try {
+          names->SaveEditedBanks();
+        } catch (VantorError const&) {
+          firstFailure = firstFailure ? firstFailure : std::current_exception();
+        }
       }
     }
+  }
+  if (firstFailure) {
+    std::rethrow_exception(firstFailure);
+  }
+}
+
+// What a round or a sign-out cannot save must not keep it from its other work.
+void Setup::TrySavingEditedBanks() {
+  try {
+    SaveEditedDestBanks();
+  } catch (VantorError const&) {
   }
 }
 

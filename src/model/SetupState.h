@@ -21,6 +21,7 @@ struct Setup::State {
   Properties properties;
   bool isDeferred = false;
   std::unique_ptr<Impl::NameFileStore> nameFileStore;
+  bool isCatalogLoaded = false;  // in this signed-in period
 };
 
 }  // namespace Ostinet

@@ -4,6 +4,7 @@
 
 #include <algorithm>
 
+#include "devicetypes/DeviceTypeApplication.h"
 #include "model/DestinationImpl.h"
 #include "model/DeviceImpl.h"
 #include "model/EntityImpl.h"
@@ -27,14 +28,25 @@ RCPtrMT<DeviceImpl> WinMIDISetup::PlatformCreateDevice(XMLLib::Parser& parser) {
   return SetupFileReader(*this, parser, SetupFileReader::kImport).ReadDevice();
 }
 
-RCPtrMT<DeviceImpl> WinMIDISetup::PlatformCreateDevice(DeviceTypeInfoImpl*, UString const& name) {
+RCPtrMT<DeviceImpl> WinMIDISetup::PlatformCreateDevice(DeviceTypeInfoImpl* type,
+                                                       UString const& name) {
   RCPtrMT<DeviceImpl> device(
       new DeviceImpl(std::make_unique<WinMIDIImplImpl>(*this, nullptr), false));
   Lists().devices.push_back(device);
   MarkChanged();
   device->SetName(name);
   MaybeAssignUniqueID(*device);
-  PlatformCreateEntity(device, UString("Port 1"), 1, 1);
+  if (type != nullptr) {
+    ApplyToDevice(*type, *device->Peer());
+  }
+  auto const groups = PortGroupsOf(type);
+  for (std::size_t i = 0; i < groups.size(); ++i) {
+    DeviceTypePortGroup const& group = groups[i];
+    auto const entity =
+        PlatformCreateEntity(device, EntityNameOf(group, i), static_cast<int>(group.outs.size()),
+                             static_cast<int>(group.ins.size()));
+    NamePorts(group, *entity);
+  }
   return device;
 }
 
@@ -77,6 +89,7 @@ void WinMIDISetup::PlatformSetEntityDestinations(RCPtrMT<EntityImpl>& entity, in
     entity->AddDestination(destination);
     Lists().destinations.push_back(destination);
     MaybeAssignUniqueID(*destination);
+    destination->RenewNewNames();
   }
   while (entity->GetDestinations().size() > wanted) {
     RemoveDestination(entity->GetDestinations().back());

@@ -139,6 +139,8 @@ void PortAttacher::AddEndpoint(PortInfo const& port, std::unique_ptr<WinMIDIPort
   setup_.AssignUniqueID(*endpoint);
   if (IsSource(port)) {
     StartInput(endpoint);
+  } else {
+    AsDestination(endpoint.get())->RenewNewNames();
   }
 }
 

@@ -131,6 +131,7 @@ void SetupFileReader::AddDestination(RCPtrMT<DestinationImpl> const& destination
   setup_.Lists().destinations.push_back(destination);
   setup_.MarkChanged();
   setup_.AssignUniqueID(*destination);
+  destination->RenewNewNames();
 }
 
 void SetupFileReader::ReadConnection(ImplImpl& peer, bool isSource) {

@@ -40,6 +40,7 @@ WinMIDISetup::PlatformCreateVirtualEndpoint(UString const& name, int uniqueID, S
   (sourceIsPublic ? Lists().sources : Lists().privateSources).push_back(source);
   (destinationIsPublic ? Lists().destinations : Lists().privateDestinations).push_back(destination);
   MarkChanged();
+  destination->RenewNewNames();
   MutexHolder const lock(virtualSourcesMutex_);
   virtualSources_.push_back(source);
   return {source, destination};

@@ -8,6 +8,7 @@
 #include "datapath/TimeBase.h"
 #include "model/DestinationImpl.h"
 #include "model/PropertyKeys.h"
+#include "names/NamesInstallation.h"
 #include "ostinet/core/Error.h"
 #include "platform/PortAttacher.h"
 #include "platform/Reconciliation.h"
@@ -27,6 +28,7 @@ namespace Impl {
 
 WinMIDISetup::WinMIDISetup()
     : pollThread_(std::make_shared<VantorJobThread>(UString("MIDI Setup Polling Thread"), 0)) {
+  InstallNames();
   pollThread_->Start();
   if (OstinetCallbackAPI::gInstance != nullptr) {
     if (auto* const provider = OstinetCallbackAPI::gInstance->GetDevicesProvider()) {

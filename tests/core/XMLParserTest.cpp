@@ -452,6 +452,18 @@ TEST(XMLParser, TakesAllTheTextBetweenTwoChildrenAtOnce) {
   EXPECT_EQ(document->ReadText().string(), text);
 }
 
+TEST(XMLParser, ListsTheNamesOfAttributesInTheOrderOfTheDocument) {
+  Document document("<R b='1' a='2' c=''><A/></R>");
+  EXPECT_TRUE(document->AttributeNames().empty());
+  document->DownToChild();
+  std::vector<Name> const expected{"b", "a", "c"};
+  EXPECT_EQ(document->AttributeNames(), expected);
+  document->DownToChild();
+  EXPECT_TRUE(document->AttributeNames().empty());
+  document->UpToParent();
+  EXPECT_EQ(document->AttributeNames(), expected);
+}
+
 TEST(XMLParser, KnowsWhitespace) {
   for (unsigned short unit = 0; unit < 0x3100; ++unit) {
     bool const expected = unit == 0x20 || unit == 0x09 || unit == 0x0A || unit == 0x0D;

@@ -144,6 +144,51 @@ TEST_F(NameFileStoreTest, UnknownFilesAreLeftAlone) {
   EXPECT_TRUE(IsThere(one));
 }
 
+class NewFileTest : public StudioTest {
+ protected:
+  UString PathOf(char const* name) const {
+    return prefs.FolderPath() + "/MIDINameDocuments/" + name;
+  }
+  File Create(NameFileStore const& store, char const* destination) {
+    File file;
+    store.CreateFile(file, *Impl::ImplOf(setup.MakePort(destination)));
+    return file;
+  }
+};
+
+TEST_F(NewFileTest, IsNamedAfterTheDestinationAndANumberIfThatIsTaken) {
+  NameFileStore const store(&prefs);
+  EXPECT_EQ(Create(store, "Synth"), FileSpecification(PathOf("Synth.midnam")));
+  EXPECT_EQ(Create(store, "Synth"), FileSpecification(PathOf("Synth 2.midnam")));
+  EXPECT_TRUE(FileSpecification(PathOf("Synth.midnam")).IsFile());
+}
+
+TEST_F(NewFileTest, NeverLeavesItsFolder) {
+  NameFileStore const store(&prefs);
+  EXPECT_EQ(Create(store, "../In/Out"), FileSpecification(PathOf(".._In_Out.midnam")));
+}
+
+TEST_F(NewFileTest, CountsOnlyOnceItIsUsed) {
+  NameFileStore store(&prefs);
+  store.Load();
+  File const file = Create(store, "Synth");
+  store.Release(file, true);
+  EXPECT_TRUE(file.IsFile());
+  store.AddUses(file, 1);
+  store.Release(file, true);
+  EXPECT_FALSE(file.IsFile());
+}
+
+TEST_F(NewFileTest, NeedsAFolderOfTheHost) {
+  EXPECT_THROW(Create(NameFileStore(nullptr), "Synth"), VantorError);
+  class NoFolder : public PrefsHandler {
+    void Save(int, std::vector<unsigned char> const&) override {}
+    void Load(int, std::vector<unsigned char>&) override {}
+    void GetFolder(Folder&) override {}
+  } noFolder;
+  EXPECT_THROW(Create(NameFileStore(&noFolder), "Synth"), VantorError);
+}
+
 class SessionFilesTest : public StudioTest {};
 
 TEST_F(SessionFilesTest, AFileThatNothingUsedIsDeletedAtSignOut) {

@@ -1,7 +1,9 @@
 // SPDX-License-Identifier: MIT
 #include <memory>
 
+#include "model/NamesHooks.h"
 #include "model/PropertyKeys.h"
+#include "ostinet/core/Error.h"
 #include "support/StudioTest.h"
 
 namespace Ostinet::Testing {
@@ -73,6 +75,79 @@ TEST_F(SetupTest, SignInLoadsTheStudioAndTellsTheListener) {
   EXPECT_EQ(setup.GetReceiver(), &receiver);
   EXPECT_EQ(setup.GetPrefsHandler(), &prefs);
   EXPECT_EQ(setup.GetListener(), &listener);
+}
+
+// The catalog's steps stand between the files in use and the studio, which needs the catalog.
+class CatalogHooks : public Impl::NamesHooks {
+ public:
+  CatalogHooks() { Impl::InstallNamesHooks(this); }
+  ~CatalogHooks() { Impl::InstallNamesHooks(nullptr); }
+  std::unique_ptr<Impl::DestinationNames> MakeNames(Impl::DestinationImpl&) const override {
+    return std::make_unique<CountingNames>(counts);
+  }
+  void LoadCatalog(PrefsHandler&) const override { calls.push_back("LoadCatalog"); }
+  void SaveCatalog(PrefsHandler&) const override { calls.push_back("SaveCatalog"); }
+
+  std::vector<std::string>& calls = TestSetup::Get().calls;
+  std::shared_ptr<CountingNames::Counts> const counts = std::make_shared<CountingNames::Counts>();
+};
+
+TEST_F(SetupTest, TheCatalogIsThereBeforeTheStudioAndSavedBeforeIt) {
+  CatalogHooks const hooks;
+  setup.SignIn("host", &receiver, &prefs);
+  EXPECT_THAT(setup.calls, ElementsAre("SignIn", "LoadCatalog", "LoadSetup"));
+  setup.calls.clear();
+  setup.SignOut(true);
+  EXPECT_THAT(setup.calls, ElementsAre("SaveCatalog", "SaveDevices", "SignOut"));
+}
+
+TEST_F(SetupTest, TheCatalogIsLeftAloneWithoutAHandlerAndWhereItWasNotLoaded) {
+  CatalogHooks const hooks;
+  setup.SignIn("host", &receiver, nullptr);
+  setup.SignOut(false);
+  setup.signInResult = Setup::kSignInPlatformError;
+  setup.SignIn("host", &receiver, &prefs);
+  setup.SignOut(false);
+  EXPECT_THAT(setup.calls, Not(Contains("LoadCatalog")));
+  EXPECT_THAT(setup.calls, Not(Contains("SaveCatalog")));
+  setup.signInResult = Setup::kSignInOK;
+  setup.SignIn("host", &receiver, &prefs);
+  setup.SignOut(false);
+  setup.calls.clear();
+  setup.SignOut(false);  // the host's handler may be gone by now
+  EXPECT_THAT(setup.calls, Not(Contains("SaveCatalog")));
+}
+
+TEST_F(SetupTest, EveryDestinationIsMadeWithItsNames) {
+  CatalogHooks const hooks;
+  Destination const port = setup.MakePort("Port");
+  ASSERT_NE(ImplOf(port)->GetNames(), nullptr);
+  ImplOf(port)->RenewNames();
+  EXPECT_EQ(hooks.counts->renewals, 1);
+}
+
+class FailingNames : public CountingNames {
+ public:
+  using CountingNames::CountingNames;
+  void SaveEditedBanks() override {
+    CountingNames::SaveEditedBanks();
+    FailOSErr(-34);  // the disk is full
+  }
+};
+
+TEST_F(SetupTest, AFailingSaveStopsNeitherTheOthersNorTheRoundsNorSignOut) {
+  auto const counts = std::make_shared<CountingNames::Counts>();
+  setup.SignIn("host", &receiver, &prefs);
+  ImplOf(setup.MakePort("Full"))->SetNames(std::make_unique<FailingNames>(counts));
+  MakePortWithNames(counts);
+  EXPECT_THROW(setup.SaveEditedDestBanks(), VantorError);
+  EXPECT_EQ(counts->saves, 2);
+  for (int round = 0; round < 30; ++round) {
+    ASSERT_NO_THROW(setup.PollSetupChanges());
+  }
+  EXPECT_EQ(counts->saves, 4);
+  EXPECT_NO_THROW(setup.SignOut(false));
+  EXPECT_FALSE(setup.IsSignedIn());
 }
 
 TEST_F(SetupTest, ASecondSignInChangesNothing) {

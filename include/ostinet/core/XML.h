@@ -4,6 +4,7 @@
 #include <cstddef>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "ostinet/Export.h"
 #include "ostinet/core/Files.h"
@@ -123,6 +124,8 @@ class OSTINET_EXPORT Parser {
   Name const& CurrentElement() const;
   /// The line on which the current element starts, from 1.
   int CurrentLine() const;
+  /// The names of the current element's attributes, in the order of the document.
+  std::vector<Name> AttributeNames() const;
   /// The text of an attribute of the current element. False, and `value` empty, if it is absent.
   bool ReadAttribute(Name const& name, UString& value) const;
   bool ReadReqAttribute(Name const& name, UString& value) const;

@@ -1,0 +1,80 @@
+// SPDX-License-Identifier: MIT
+#include <algorithm>
+#include <cstdlib>
+#include <string_view>
+
+#include "devicetypes/DevTypeFileReader.h"
+#include "ostinet/core/Error.h"
+
+namespace Ostinet {
+
+namespace {
+
+using Types = std::vector<RCPtrMT<Impl::DeviceTypeInfoImpl>>;
+
+// The first type of a model counts, also within a file.
+bool IsRepeated(Types const& types, std::size_t index) {
+  auto const end = types.begin() + static_cast<std::ptrdiff_t>(index);
+  return std::any_of(types.begin(), end, [&](auto const& earlier) {
+    return Impl::IsSameModel(*earlier, *types[index]);
+  });
+}
+
+bool IsInstalled(UString const& image) {
+  FileSpecification found;
+  return Folder::Find(Folder::kSystemDeviceFiles, Folder::kDoNotCreate).SearchFolder(image, found);
+}
+
+// The line where the parser gave up, which it names at the start of its text; 0 for a file that
+// could not be read at all.
+int LineOf(VantorError const& fault) {
+  constexpr std::string_view kBefore = "line ";
+  bool const namesLine = fault.Domain() == "XML" && fault.Text().starts_with(kBefore);
+  return namesLine ? std::atoi(fault.Text().c_str() + kBefore.size()) : 0;
+}
+
+DeviceTypeFileNote NoteOfFault() {
+  VantorError const fault = VantorError::GetCurrentError();
+  int const line = LineOf(fault);
+  return {line, (line == 0 ? "the file cannot be read: "
+                           : "nothing is read from here on, nor the type that stands open: ") +
+                    UString(fault.Text())};
+}
+
+// What only the whole file tells.
+void CheckTypes(Impl::DevTypeFileReader const& reader, DeviceTypeFileCheck& check) {
+  for (std::size_t i = 0; i < reader.Types().size(); ++i) {
+    Impl::DeviceTypeInfoImpl const& type = *reader.Types()[i];
+    if (IsRepeated(reader.Types(), i)) {
+      check.notes.push_back(
+          {reader.Lines()[i], "\"" + type.manufacturer + "\" \"" + type.model +
+                                  "\" stands above already: this one is skipped"});
+      continue;
+    }
+    check.types.push_back(DeviceTypeInfo(reader.Types()[i]));
+    if (!type.image.empty() && !IsInstalled(type.image)) {
+      check.notes.push_back({reader.Lines()[i], "the picture \"" + type.image +
+                                                    "\" is not in the machine's folder of device "
+                                                    "files: devices will have none"});
+    }
+  }
+}
+
+}  // namespace
+
+DeviceTypeFileCheck CheckDeviceTypeFile(File const& file) {
+  DeviceTypeFileCheck check;
+  Impl::DevTypeFileReader reader(file, &check.notes);
+  try {
+    reader.Read();
+  } catch (...) {
+    check.notes.push_back(NoteOfFault());
+  }
+  check.author = reader.Author();
+  CheckTypes(reader, check);
+  std::stable_sort(check.notes.begin(), check.notes.end(),
+                   [](auto const& a, auto const& b) { return a.line < b.line; });
+  return check;
+}
+
+}  // namespace Ostinet
