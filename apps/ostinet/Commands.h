@@ -27,7 +27,14 @@ void AddPanicCommand(CLI::App& app, CommandLine& line);
 void AddRefCommand(CLI::App& app, CommandLine& line);
 void AddResolveCommand(CLI::App& app, CommandLine& line);
 void AddPairCommand(CLI::App& app, CommandLine& line);
+void AddDeviceCommand(CLI::App& app, CommandLine& line);
+void AddEntityCommand(CLI::App& app, CommandLine& line);
+void AddConnectCommand(CLI::App& app, CommandLine& line);
+void AddDisconnectCommand(CLI::App& app, CommandLine& line);
+void AddVirtualCommand(CLI::App& app, CommandLine& line);
+void AddDrawCommand(CLI::App& app, CommandLine& line);
 void AddTypesCommand(CLI::App& app, CommandLine& line);
+void AddDetectCommand(CLI::App& app, CommandLine& line);
 
 /// Adds --for and --count.
 void AddLimits(CLI::App& command, Limits& limits);

@@ -2,12 +2,13 @@
 #include <CLI/CLI.hpp>
 #include <algorithm>
 #include <cstdio>
+#include <utility>
 
 #include "Commands.h"
 #include "DetectText.h"
 #include "DetectedDevices.h"
 #include "Errors.h"
-#include "NameMatch.h"
+#include "Lookup.h"
 #include "Output.h"
 #include "ostinet/core/Terminal.h"
 
@@ -33,12 +34,16 @@ class ProgressDisplay {
     auto const progress = run.GetProgress();
     if (isShown_ && progress.port < run.Ports().size()) {
       std::string const port = run.Ports()[progress.port].destination.GetName().string();
-      Write(ProgressLine(progress, port, kWidth));
+      std::string const line = ProgressLine(progress, port, kWidth);
+      if (line != last_) {
+        Write(line);
+        last_ = line;
+      }
     }
   }
 
   void Clear() {
-    if (isShown_) {
+    if (!std::exchange(last_, "").empty()) {
       Write("");
     }
   }
@@ -53,16 +58,8 @@ class ProgressDisplay {
   }
 
   bool const isShown_;
+  std::string last_;  // what stands on the line
 };
-
-template <class Port>
-std::vector<Candidate> CandidatesOf(std::vector<Port> const& ports) {
-  std::vector<Candidate> candidates;
-  for (Port const& port : ports) {
-    candidates.push_back({port.GetName().string(), port.GetUniqueID()});
-  }
-  return candidates;
-}
 
 // A name stands for the output and for the input that it fits; it has to fit one of them.
 std::vector<Endpoint> Excluded(std::vector<std::string> const& names) {
@@ -70,17 +67,13 @@ std::vector<Endpoint> Excluded(std::vector<std::string> const& names) {
   std::vector<Source> const sources = DetectionRun::SourcesToHear();
   std::vector<Endpoint> excluded;
   for (std::string const& name : names) {
-    auto const destination = FindName(CandidatesOf(destinations), name, "port");
-    auto const source = FindName(CandidatesOf(sources), name, "port");
-    if (!destination && !source) {
-      MatchName(CandidatesOf(destinations), name, "port");  // Tells what there is.
+    Destination const destination = TryFind(destinations, name, "port");
+    Source const source = TryFind(sources, name, "port");
+    if (!destination.Exists() && !source.Exists()) {
+      Find(destinations, name, "port");  // Throws, and tells which there are.
     }
-    if (destination) {
-      excluded.push_back(destinations[*destination]);
-    }
-    if (source) {
-      excluded.push_back(sources[*source]);
-    }
+    excluded.push_back(destination);
+    excluded.push_back(source);
   }
   return excluded;
 }
@@ -89,7 +82,7 @@ std::vector<Destination> Chosen(std::vector<Destination> const& all,
                                 std::vector<std::string> const& names) {
   std::vector<Destination> chosen;
   for (std::string const& name : names) {
-    Destination const port = all[MatchName(CandidatesOf(all), name, "port")];
+    Destination const port = Find(all, name, "port");
     if (std::find(chosen.begin(), chosen.end(), port) == chosen.end()) {
       chosen.push_back(port);
     }
@@ -120,7 +113,7 @@ std::vector<DetectedPort> View(DetectionRun const& run) {
 // Notes in the views what was made. True if anything was.
 bool CreateDevices(Setup& setup, DetectionRun const& run, std::vector<DetectedPort>& views) {
   bool isAnyMade = false;
-  for (std::size_t i = 0; i < run.Ports().size(); ++i) {
+  for (std::size_t i = 0; i < views.size(); ++i) {
     DetectionRun::Port const& port = run.Ports()[i];
     for (std::size_t j = 0; j < port.findings.size(); ++j) {
       if (auto const device = CreateDetectedDevice(setup, port.destination, port.findings[j])) {
@@ -132,6 +125,36 @@ bool CreateDevices(Setup& setup, DetectionRun const& run, std::vector<DetectedPo
   return isAnyMade;
 }
 
+void ForgetDevices(std::vector<DetectedPort>& views) {
+  for (DetectedPort& port : views) {
+    for (FindingView& finding : port.findings) {
+      finding.device.reset();
+    }
+  }
+}
+
+// What was found took its time, so it is printed also where the devices cannot be kept.
+void KeepDevices(GlobalOptions const& globals, Session& session, std::vector<DetectedPort>& views) {
+  try {
+    session.Save();
+  } catch (...) {
+    ForgetDevices(views);
+    Print(globals.json, views);
+    throw;
+  }
+}
+
+// Runs to the end, or until Ctrl-C.
+void RunShown(Session& session, DetectionRun& run, ProgressDisplay& display) {
+  display.Show(run);
+  session.Run([&] {
+    bool const goesOn = run.Step();
+    display.Show(run);
+    return goesOn;
+  });
+  display.Clear();
+}
+
 void Detect(GlobalOptions const& globals, DetectOptions const& options) {
   Session session(globals, nullptr, nullptr);
   std::vector<Endpoint> const excluded = Excluded(options.excluded);
@@ -141,23 +164,15 @@ void Detect(GlobalOptions const& globals, DetectOptions const& options) {
   }
   DetectionRun::Options runOptions;
   runOptions.portTimeLimit = options.timeout;
-  ProgressDisplay display;
-  DetectionRun* running = nullptr;
-  runOptions.onProgress = [&] {
-    if (running != nullptr) {
-      display.Show(*running);
-    }
-  };
   DetectionRun run(destinations, DetectionRun::SourcesToHear(excluded), std::move(runOptions));
-  running = &run;
-  session.Run([&] { return run.Step(); });
+  ProgressDisplay display;
+  RunShown(session, run, display);
   bool const isWhole = run.IsDone();
   run.Cancel();
-  display.Clear();
 
   std::vector<DetectedPort> views = View(run);
   if (isWhole && options.create && CreateDevices(session.GetSetup(), run, views)) {
-    session.Save();
+    KeepDevices(globals, session, views);
   }
   Print(globals.json, views);
   if (!isWhole) {

@@ -29,6 +29,7 @@ struct EndpointView {
   std::optional<bool> isInterface;
   int scheduleAheadMuSec = 0;
   std::optional<std::string> port;     ///< of an instrument: the port that it hangs on
+  unsigned long long portKey = 0;      ///< that port's key
   std::vector<std::string> connected;  ///< of a port: what hangs on it
 
   bool operator==(EndpointView const&) const = default;

@@ -68,7 +68,9 @@ int Main(int argc, char** argv) {
   AddGlobals(app, line.options);
   for (auto const add :
        {AddListCommand, AddWatchCommand, AddMonitorCommand, AddSendCommand, AddPanicCommand,
-        AddRefCommand, AddResolveCommand, AddPairCommand, AddTypesCommand}) {
+        AddRefCommand, AddResolveCommand, AddPairCommand, AddTypesCommand, AddDetectCommand,
+        AddDeviceCommand, AddEntityCommand, AddConnectCommand, AddDisconnectCommand,
+        AddVirtualCommand, AddDrawCommand}) {
     add(app, line);
   }
   try {

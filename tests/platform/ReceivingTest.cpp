@@ -135,11 +135,28 @@ TEST_F(LegacyInput, AFilterThatThrowsLosesThePacketOnly) {
   EXPECT_THAT(receiver.AllBytes(), ElementsAre(Bytes{0x90, 2, 1}));
 }
 
+// The system counts milliseconds from the start of the input, the stamp from the host's zero.
 TEST_F(LegacyInput, IsStampedFromItsStart) {
+  constexpr long long kMillisecond = 10000;
+  SignOut();
+  midi.MoveClockByHand(1000 * kMillisecond);
+  midi.SetStepPerReading(1);
+  SignIn();
+  midi.SetStepPerReading(0);
+  ASSERT_LT(midi.Now(), 1001 * kMillisecond) << "the sign-in took a reading too many for this test";
+  auto const stampAfter = [](long long milliseconds) {
+    double const start = 1000 / 1000.0;
+    return EventTimeToMIDITime(start + static_cast<double>(milliseconds) / 1000.0).Value();
+  };
+  ASSERT_TRUE(midi.AdvanceClocks(5 * kMillisecond));
   Arrive({0x90, 1, 1});
-  setup.ProcessInput();
-  ASSERT_EQ(receiver.packets.size(), 1u);
-  EXPECT_NE(receiver.packets[0].clocks, 0u);
+  ASSERT_TRUE(midi.AdvanceClocks(250 * kMillisecond));
+  Arrive({0x90, 2, 1});
+  ASSERT_TRUE(midi.AdvanceClocks(kMillisecond));
+  setup.ProcessInput();  // later, which no stamp shows
+  ASSERT_EQ(receiver.packets.size(), 2u);
+  EXPECT_EQ(receiver.packets[0].clocks, stampAfter(5));
+  EXPECT_EQ(receiver.packets[1].clocks, stampAfter(255));
 }
 
 TEST_F(LegacyInput, OpensAndClosesInOrder) {
