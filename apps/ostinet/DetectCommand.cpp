@@ -22,6 +22,15 @@ struct DetectOptions {
   bool create = false;
 };
 
+// Lets through what the run, which hears the sources directly, is to get.
+class SysexFilter : public Receiver {
+ public:
+  bool WantsPacket(DataPacket const& packet, Source const&) override {
+    return DetectionRun::IsSysex(packet);
+  }
+  void HandlePacket(DataPacket const&, Source const&) override {}
+};
+
 // The line of a terminal that is written over and over.
 class ProgressDisplay {
  public:
@@ -156,7 +165,8 @@ void RunShown(Session& session, DetectionRun& run, ProgressDisplay& display) {
 }
 
 void Detect(GlobalOptions const& globals, DetectOptions const& options) {
-  Session session(globals, nullptr, nullptr);
+  SysexFilter filter;
+  Session session(globals, &filter, nullptr);
   std::vector<Endpoint> const excluded = Excluded(options.excluded);
   auto const destinations = Chosen(DetectionRun::DestinationsToAsk(excluded), options.ports);
   if (destinations.empty()) {
