@@ -35,6 +35,15 @@ void AddVirtualCommand(CLI::App& app, CommandLine& line);
 void AddDrawCommand(CLI::App& app, CommandLine& line);
 void AddTypesCommand(CLI::App& app, CommandLine& line);
 void AddDetectCommand(CLI::App& app, CommandLine& line);
+void AddNamesCommand(CLI::App& app, CommandLine& line);
+void AddModesCommand(CLI::App& app, CommandLine& line);
+void AddBanksCommand(CLI::App& app, CommandLine& line);
+void AddPatchesCommand(CLI::App& app, CommandLine& line);
+void AddNotesCommand(CLI::App& app, CommandLine& line);
+void AddControlsCommand(CLI::App& app, CommandLine& line);
+void AddSelectCommand(CLI::App& app, CommandLine& line);
+void AddModeCommand(CLI::App& app, CommandLine& line);
+void AddNoteNameCommand(CLI::App& app, CommandLine& line);
 
 /// Adds --for and --count.
 void AddLimits(CLI::App& command, Limits& limits);

@@ -112,7 +112,7 @@ TEST_F(CheckingTypes, TellsWhereTheXMLBreaks) {
       Check("<MIDIDeviceTypes>\n" + TypeElement("Acme", "Synth") + "\n<MIDIDeviceType></Oops>");
   ASSERT_EQ(check.notes.size(), 2U);
   EXPECT_EQ(check.notes[1].line, 3);
-  EXPECT_THAT(check.notes[1].text.string(), StartsWith("nothing is read from here on"));
+  EXPECT_THAT(check.notes[1].text.string(), StartsWith("nothing is read from here on: mismatched"));
   EXPECT_EQ(check.types.size(), 1U);
 }
 

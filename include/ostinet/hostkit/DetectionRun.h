@@ -28,7 +28,7 @@ namespace Ostinet {
 /// Ownership    The host's. It keeps handles, so ports may come and go meanwhile.
 /// Threads      The host's polling thread; WantsPacket [any thread].
 /// Errors       Step throws where the system cannot tell the time; the run is then to be cancelled.
-class DetectionRun : public Receiver, private Noncopyable<DetectionRun> {
+class DetectionRun final : public Receiver, private Noncopyable<DetectionRun> {
  public:
   using Bytes = std::vector<unsigned char>;
 

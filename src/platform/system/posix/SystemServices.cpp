@@ -10,6 +10,7 @@
 #include <cerrno>
 #include <cstdio>
 #include <cstdlib>
+#include <new>
 #include <string>
 
 namespace Ostinet::SystemServices {
@@ -100,6 +101,22 @@ void NameThisThread(UString const& name, int) {
   // Without a name the thread runs as well. Priorities other than the usual are for programs
   // with special rights, which this library does not ask for.
   static_cast<void>(::pthread_setname_np(::pthread_self(), text.c_str()));
+}
+
+ThreadSlot::ThreadSlot(void (*free)(void*)) {
+  pthread_key_t key = 0;
+  if (::pthread_key_create(&key, free) != 0) {
+    throw std::bad_alloc();
+  }
+  key_ = key;
+}
+
+void* ThreadSlot::Get() const { return ::pthread_getspecific(static_cast<pthread_key_t>(key_)); }
+
+void ThreadSlot::Set(void* pointer) {
+  if (::pthread_setspecific(static_cast<pthread_key_t>(key_), pointer) != 0) {
+    throw std::bad_alloc();
+  }
 }
 
 OutputFile::~OutputFile() { Close(); }

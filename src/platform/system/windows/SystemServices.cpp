@@ -4,6 +4,7 @@
 #include <windows.h>
 
 #include <algorithm>
+#include <new>
 #include <string>
 #include <vector>
 
@@ -92,6 +93,21 @@ void NameThisThread(UString const& name, int priority) {
   }
   if (priority > 0) {
     ::SetThreadPriority(::GetCurrentThread(), THREAD_PRIORITY_ABOVE_NORMAL);
+  }
+}
+
+ThreadSlot::ThreadSlot(void (*free)(void*))
+    : key_(::FlsAlloc(reinterpret_cast<PFLS_CALLBACK_FUNCTION>(free))) {
+  if (key_ == FLS_OUT_OF_INDEXES) {
+    throw std::bad_alloc();
+  }
+}
+
+void* ThreadSlot::Get() const { return ::FlsGetValue(key_); }
+
+void ThreadSlot::Set(void* pointer) {
+  if (::FlsSetValue(key_, pointer) == 0) {
+    throw std::bad_alloc();
   }
 }
 
