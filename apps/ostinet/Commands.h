@@ -33,6 +33,15 @@ void AddConnectCommand(CLI::App& app, CommandLine& line);
 void AddDisconnectCommand(CLI::App& app, CommandLine& line);
 void AddVirtualCommand(CLI::App& app, CommandLine& line);
 void AddDrawCommand(CLI::App& app, CommandLine& line);
+void AddNamesCommand(CLI::App& app, CommandLine& line);
+void AddModesCommand(CLI::App& app, CommandLine& line);
+void AddBanksCommand(CLI::App& app, CommandLine& line);
+void AddPatchesCommand(CLI::App& app, CommandLine& line);
+void AddNotesCommand(CLI::App& app, CommandLine& line);
+void AddControlsCommand(CLI::App& app, CommandLine& line);
+void AddSelectCommand(CLI::App& app, CommandLine& line);
+void AddModeCommand(CLI::App& app, CommandLine& line);
+void AddNoteNameCommand(CLI::App& app, CommandLine& line);
 void AddTypesCommand(CLI::App& app, CommandLine& line);
 
 /// Adds --for and --count.

@@ -26,7 +26,9 @@ ViewFilter FilterOf(ListOptions const& options) {
 
 void List(GlobalOptions const& globals, ListOptions const& options) {
   Session const session(globals, nullptr, nullptr);
-  StudioView const view = Filtered(ViewStudio(session.GetSetup()), FilterOf(options));
+  StudioView whole = ViewStudio(session.GetSetup());
+  AddPlaying(whole, session.GetSetup());
+  StudioView const view = Filtered(whole, FilterOf(options));
   if (globals.json) {
     PrintLine(StudioJSON(view));
     return;

@@ -24,6 +24,12 @@ void PrintLine(std::string const& line) {
   throw Failure(std::string("the output cannot be written: ") + std::strerror(errno));
 }
 
+void PrintOne(bool asJSON, std::string const& json, std::vector<std::string> const& lines) {
+  for (std::string const& line : asJSON ? std::vector<std::string>{json} : lines) {
+    PrintLine(line);
+  }
+}
+
 void Notify(std::string const& sentence) {
   std::fprintf(stderr, "ostinet: %s\n", sentence.c_str());
   std::fflush(stderr);

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <string>
+#include <vector>
 
 namespace Ostinet::Tool {
 
@@ -11,6 +12,9 @@ struct OutputClosed {};
 /// Writes a line to the standard output and hands it on at once, so that a reader behind a pipe
 /// sees it. Throws OutputClosed where the reader has gone, Failure where writing failed otherwise.
 void PrintLine(std::string const& line);
+
+/// Writes what a command found: the JSON if that is asked for, else the lines.
+void PrintOne(bool asJSON, std::string const& json, std::vector<std::string> const& lines);
 
 /// A notice for people on the standard error: "ostinet: " and the sentence.
 void Notify(std::string const& sentence);

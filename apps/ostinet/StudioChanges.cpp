@@ -144,6 +144,9 @@ std::string ChangeText(Change const& change) {
   std::string text = event + kind + change.name;
   text += change.was ? "  (was " + *change.was + ")" : "";
   text += change.with ? "  (" + *change.with + ")" : "";
+  for (PlayingView const& patch : change.playing) {
+    text += "  (" + PlayingText(patch) + ")";
+  }
   text += change.mask ? "  (channels " + ChannelsText(*change.mask) + ")" : "";
   return text;
 }
@@ -158,6 +161,10 @@ std::string ChangeJSON(Change const& change) {
   }
   if (change.with) {
     json["with"] = *change.with;
+  }
+  for (PlayingView const& patch : change.playing) {
+    json["playing"].push_back(
+        {{"channel", patch.channel}, {"number", patch.number}, {"name", patch.name}});
   }
   if (change.mask) {
     json["channels"] = *change.mask;

@@ -17,6 +17,7 @@ struct Change {
   int uniqueID = 0;
   std::optional<std::string> was;      ///< of "renamed": the name before
   std::optional<std::string> with;     ///< of "connected" and "disconnected": what hangs there
+  std::vector<PlayingView> playing;    ///< of "patch": what plays there now
   std::optional<unsigned short> mask;  ///< of "patch" and "names": the channels, bit 0 the first
 };
 

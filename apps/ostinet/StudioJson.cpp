@@ -19,6 +19,10 @@ Json Array(std::vector<View> const& views, ToJson toJson) {
   return array;
 }
 
+Json PlayingJson(PlayingView const& patch) {
+  return {{"channel", patch.channel}, {"number", patch.number}, {"name", patch.name}};
+}
+
 Json EndpointJson(EndpointView const& endpoint) {
   return {{"name", endpoint.name},
           {"uniqueID", endpoint.uniqueID},
@@ -32,7 +36,8 @@ Json EndpointJson(EndpointView const& endpoint) {
           {"isInterface", endpoint.isInterface ? Json(*endpoint.isInterface) : Json()},
           {"scheduleAheadMuSec", endpoint.scheduleAheadMuSec},
           {"port", endpoint.port ? Json(*endpoint.port) : Json()},
-          {"connected", endpoint.connected}};
+          {"connected", endpoint.connected},
+          {"playing", Array(endpoint.playing, PlayingJson)}};
 }
 
 Json EntityJson(EntityView const& entity) {

@@ -48,6 +48,9 @@ class Lines {
     if (endpoint.port) {
       Add(depth + 1, "on port " + *endpoint.port);
     }
+    for (PlayingView const& patch : endpoint.playing) {
+      Add(depth + 1, "plays " + PlayingText(patch));
+    }
     for (std::string const& instrument : endpoint.connected) {
       Add(depth + 1, "carries " + instrument);
     }
@@ -98,6 +101,10 @@ std::vector<std::string> StudioLines(StudioView const& view) {
   lines.AddEndpoints("Inputs", view.sources);
   lines.AddEndpoints("Outputs", view.destinations);
   return lines.Take();
+}
+
+std::string PlayingText(PlayingView const& patch) {
+  return patch.number + " " + patch.name + " on channel " + std::to_string(patch.channel);
 }
 
 std::string ChannelsText(unsigned short mask) {

@@ -15,6 +15,9 @@ std::vector<std::string> StudioLines(StudioView const& view);
 /// The studio as one JSON object, indented.
 std::string StudioJSON(StudioView const& view);
 
+/// "5 Piano on channel 1".
+std::string PlayingText(PlayingView const& patch);
+
 /// "1-4, 10" for a mask of channels, of which bit 0 is channel 1; "none" for 0.
 std::string ChannelsText(unsigned short mask);
 

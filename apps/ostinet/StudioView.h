@@ -6,13 +6,23 @@
 #include <vector>
 
 namespace Ostinet {
+class Destination;
 class Setup;
-}
+}  // namespace Ostinet
 
 namespace Ostinet::Tool {
 
 // The studio as plain values, taken at one moment. Listings, JSON and the search for changes all
 // read this, so the walk over the model is made in one place. Texts are UTF-8.
+
+/// The patch on a channel.
+struct PlayingView {
+  int channel = 0;  ///< 1 to 16
+  std::string number;
+  std::string name;
+
+  bool operator==(PlayingView const&) const = default;
+};
 
 struct EndpointView {
   unsigned long long key = 0;  ///< the same for the same object as long as the program runs
@@ -31,6 +41,7 @@ struct EndpointView {
   std::optional<std::string> port;     ///< of an instrument: the port that it hangs on
   unsigned long long portKey = 0;      ///< that port's key
   std::vector<std::string> connected;  ///< of a port: what hangs on it
+  std::vector<PlayingView> playing;    ///< of a destination: what AddPlaying found
 
   bool operator==(EndpointView const&) const = default;
 };
@@ -63,6 +74,12 @@ struct StudioView {
 
 /// Looks at the whole studio. On the polling thread.
 StudioView ViewStudio(Setup const& setup);
+
+/// The patches that play on those channels of `channels`, bit 0 being channel 1, as far as they
+/// were selected through this program.
+std::vector<PlayingView> ViewPlaying(Destination const& destination, unsigned short channels);
+/// Fills in what plays on every public destination.
+void AddPlaying(StudioView& view, Setup const& setup);
 
 /// Which part of a studio is asked for.
 struct ViewFilter {

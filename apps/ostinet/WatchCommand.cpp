@@ -26,6 +26,7 @@ class Watcher : public SetupListener {
 
   void CurrentPatchChanged(Destination destination, unsigned short channels) override {
     changes_.push_back(ChannelsChange("patch", destination, channels));
+    changes_.back().playing = ViewPlaying(destination, channels);
   }
 
   void DestinationNamesChanged(Destination destination, unsigned short channels) override {

@@ -66,10 +66,13 @@ int Main(int argc, char** argv) {
   CommandLine line;
   Describe(app);
   AddGlobals(app, line.options);
-  for (auto const add : {AddListCommand, AddWatchCommand, AddMonitorCommand, AddSendCommand,
-                         AddPanicCommand, AddRefCommand, AddResolveCommand, AddPairCommand,
-                         AddTypesCommand, AddDeviceCommand, AddEntityCommand, AddConnectCommand,
-                         AddDisconnectCommand, AddVirtualCommand, AddDrawCommand}) {
+  for (auto const add :
+       {AddListCommand,       AddWatchCommand,   AddMonitorCommand, AddSendCommand,
+        AddPanicCommand,      AddRefCommand,     AddResolveCommand, AddPairCommand,
+        AddTypesCommand,      AddDeviceCommand,  AddEntityCommand,  AddConnectCommand,
+        AddDisconnectCommand, AddVirtualCommand, AddDrawCommand,    AddNamesCommand,
+        AddModesCommand,      AddBanksCommand,   AddPatchesCommand, AddNotesCommand,
+        AddControlsCommand,   AddSelectCommand,  AddModeCommand,    AddNoteNameCommand}) {
     add(app, line);
   }
   try {

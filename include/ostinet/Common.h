@@ -60,8 +60,9 @@ class RCObjectMT {
   mutable std::atomic<int> count_{0};
 };
 
-/// Intrusive pointer to a counted object. The members are defined out of class, so that a pointer
-/// to one of the library's own classes works in a host that sees only their names.
+/// Intrusive pointer to a counted object. The members are defined out of class, none of them
+/// inline, so that a pointer to one of the library's own classes works in a host that sees only
+/// their names: a DLL exports no inline members of a template.
 ///
 /// Threads      One pointer belongs to one thread at a time; the object behind it is counted
 ///              atomically, so pointers to one object may live on any threads.
@@ -79,14 +80,14 @@ class RCPtrMT {
   /// Shares `pointer`. The old object is released last, so a pointer into it may be assigned.
   RCPtrMT& operator=(T* pointer);
 
-  T* get() const { return pointer_; }
-  T* operator->() const { return pointer_; }
-  T& operator*() const { return *pointer_; }
-  explicit operator bool() const { return pointer_ != nullptr; }
+  T* get() const;
+  T* operator->() const;
+  T& operator*() const;
+  explicit operator bool() const;
 
-  bool operator==(RCPtrMT const& other) const { return pointer_ == other.pointer_; }
-  bool operator!=(RCPtrMT const& other) const { return pointer_ != other.pointer_; }
-  bool operator<(RCPtrMT const& other) const { return std::less<T*>()(pointer_, other.pointer_); }
+  bool operator==(RCPtrMT const& other) const;
+  bool operator!=(RCPtrMT const& other) const;
+  bool operator<(RCPtrMT const& other) const;
 
  private:
   T* pointer_;
@@ -130,6 +131,41 @@ RCPtrMT<T>& RCPtrMT<T>::operator=(T* pointer) {
     }
   }
   return *this;
+}
+
+template <class T>
+T* RCPtrMT<T>::get() const {
+  return pointer_;
+}
+
+template <class T>
+T* RCPtrMT<T>::operator->() const {
+  return pointer_;
+}
+
+template <class T>
+T& RCPtrMT<T>::operator*() const {
+  return *pointer_;
+}
+
+template <class T>
+RCPtrMT<T>::operator bool() const {
+  return pointer_ != nullptr;
+}
+
+template <class T>
+bool RCPtrMT<T>::operator==(RCPtrMT const& other) const {
+  return pointer_ == other.pointer_;
+}
+
+template <class T>
+bool RCPtrMT<T>::operator!=(RCPtrMT const& other) const {
+  return pointer_ != other.pointer_;
+}
+
+template <class T>
+bool RCPtrMT<T>::operator<(RCPtrMT const& other) const {
+  return std::less<T*>()(pointer_, other.pointer_);
 }
 
 // Instantiated once, in the library, where these classes are complete.

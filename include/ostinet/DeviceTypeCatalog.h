@@ -114,6 +114,7 @@ class OSTINET_EXPORT DeviceTypeCatalog : private Noncopyable<DeviceTypeCatalog> 
 
   /// The requests, the universal inquiry first.
   int CountAutodetectRequests() const;
+  /// A null handle out of range.
   Autodetect::Request GetAutodetectRequest(int index) const;
 
  private:

@@ -15,12 +15,15 @@ VantorJobThread::~VantorJobThread() { Terminate(); }
 void VantorJobThread::Start() {
   MutexHolder lock(mutex_);
   if (!thread_.joinable() && !IsTerminated()) {
-    thread_ = std::thread([this] { RunJobs(); });
+    thread_ = std::thread([queue = queue_, name = name_, priority = priority_] {
+      SystemServices::NameThisThread(name, priority);
+      RunJobs(*queue);
+    });
   }
 }
 
 void VantorJobThread::Terminate() {
-  auto const waiting = queue_.close();
+  auto const waiting = queue_->close();
   terminated_.store(true, std::memory_order_release);
   for (auto const& job : waiting) {
     job->Cancel();
@@ -35,9 +38,8 @@ VantorError VantorJobThread::TerminatedError() {
   return VantorError("VantorThreads", "VantorJobThread", 0, "Thread terminated");
 }
 
-void VantorJobThread::RunJobs() {
-  SystemServices::NameThisThread(name_, priority_);
-  while (auto job = queue_.pop()) {
+void VantorJobThread::RunJobs(JobQueue& queue) {
+  while (auto job = queue.pop()) {
     try {
       (*job)->Run();
     } catch (...) {

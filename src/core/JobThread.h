@@ -45,7 +45,7 @@ class VantorJobThread : private Noncopyable<VantorJobThread> {
   /// on the thread itself, it does not wait. A second time it does nothing.
   void Terminate();
   bool IsTerminated() const { return terminated_.load(std::memory_order_acquire); }
-  JobQueue& GetJobQueue() { return queue_; }
+  JobQueue& GetJobQueue() { return *queue_; }
 
   /// Runs `work` on the thread; the future gets what it returns, or the error that it throws.
   /// On a terminated thread the future is complete at once, with the error "Thread terminated".
@@ -56,11 +56,13 @@ class VantorJobThread : private Noncopyable<VantorJobThread> {
   static VantorError TerminatedError();
 
  private:
-  void RunJobs();
+  static void RunJobs(JobQueue& queue);
 
   UString const name_;
   int const priority_;
-  JobQueue queue_;
+  // The thread shares it. Where the system ends all threads before it destroys static objects, as
+  // Windows does, the queue on which a thread died is never destroyed: nobody could wake it.
+  std::shared_ptr<JobQueue> const queue_ = std::make_shared<JobQueue>();
   // Stored by the thread that terminates; any thread may ask, and then sees the closed queue.
   std::atomic<bool> terminated_{false};
   VantorCoreMutex mutex_;
@@ -102,7 +104,7 @@ class FutureJob : public VantorJobQueueJob {
 template <class T>
 std::shared_ptr<VantorFuture<T>> VantorJobThread::Post(std::function<T()> work) {
   auto const job = std::make_shared<Impl::FutureJob<T>>(std::move(work));
-  if (!queue_.push(job)) {
+  if (!queue_->push(job)) {
     job->Fail(TerminatedError());
   }
   return job->GetFuture();

@@ -38,6 +38,22 @@ std::optional<long long> ModificationTime(std::filesystem::path const& path);
 /// Names the calling thread for debuggers and lists of threads, and asks for its priority.
 void NameThisThread(UString const& name, int priority);
 
+/// One pointer for each thread. Where a thread ends with a pointer set, `free` is called with it, on
+/// that thread. Never destroyed in practice: threads may end after any static object did.
+class ThreadSlot {
+ public:
+  explicit ThreadSlot(void (*free)(void*));
+  ThreadSlot(ThreadSlot const&) = delete;
+  ThreadSlot& operator=(ThreadSlot const&) = delete;
+  ~ThreadSlot() = delete;
+
+  void* Get() const;
+  void Set(void* pointer);
+
+ private:
+  unsigned long key_;
+};
+
 /// A file being written, through the system's own calls, so that each can be told to fail. Each
 /// operation gives 0 or the system's error number.
 class OutputFile {
@@ -65,5 +81,6 @@ int AlreadyExistsError();
 int RenameOver(std::filesystem::path const& from, std::filesystem::path const& to);
 /// A number that no other running process has.
 unsigned long ProcessNumber();
+bool IsErrorOutputATerminal();
 
 }  // namespace Ostinet::SystemServices

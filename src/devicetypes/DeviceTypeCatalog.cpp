@@ -3,13 +3,15 @@
 
 #include <algorithm>
 
+#include "devicetypes/AutodetectRequests.h"
 #include "devicetypes/DeviceTypeCatalogImpl.h"
 
 namespace Ostinet {
 
 namespace Impl {
 
-DeviceTypeCatalogImpl::DeviceTypeCatalogImpl() : types_(ReadDeviceTypeFiles()) {}
+DeviceTypeCatalogImpl::DeviceTypeCatalogImpl()
+    : types_(ReadDeviceTypeFiles()), requests_(BuildAutodetectRequests(types_)) {}
 
 DeviceTypeInfo DeviceTypeCatalogImpl::GetType(int index) const {
   bool const isThere = index >= 0 && static_cast<std::size_t>(index) < types_.size();
@@ -41,6 +43,11 @@ void DeviceTypeCatalogImpl::CollectModels(UString const& manufacturer,
                    });
 }
 
+Autodetect::Request DeviceTypeCatalogImpl::GetRequest(int index) const {
+  bool const isThere = index >= 0 && index < CountRequests();
+  return Autodetect::Request(isThere ? requests_[static_cast<std::size_t>(index)] : nullptr);
+}
+
 }  // namespace Impl
 
 DeviceTypeCatalog::DeviceTypeCatalog()
@@ -68,8 +75,10 @@ void DeviceTypeCatalog::CollectModels(UString const& manufacturer,
   impl_->CollectModels(manufacturer, models);
 }
 
-int DeviceTypeCatalog::CountAutodetectRequests() const {
-  return static_cast<int>(impl_->GetRequests().size());
+int DeviceTypeCatalog::CountAutodetectRequests() const { return impl_->CountRequests(); }
+
+Autodetect::Request DeviceTypeCatalog::GetAutodetectRequest(int index) const {
+  return impl_->GetRequest(index);
 }
 
 }  // namespace Ostinet

@@ -31,11 +31,13 @@ class DeviceTypeCatalogImpl : private Noncopyable<DeviceTypeCatalogImpl> {
   /// Appends the types of exactly this maker and sorts all of `models`.
   void CollectModels(UString const& manufacturer, std::vector<DeviceTypeInfo>& models) const;
 
-  AutodetectRequests const& GetRequests() const { return requests_; }
+  int CountRequests() const { return static_cast<int>(requests_.size()); }
+  /// A null handle out of range.
+  Autodetect::Request GetRequest(int index) const;
 
  private:
   DeviceTypes types_;
-  AutodetectRequests requests_;
+  AutodetectRequests requests_;  // after the types, to which it adds
 };
 
 /// The types of all files that end in ".middev", the user's first, one for each maker and model.

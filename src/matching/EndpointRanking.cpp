@@ -5,6 +5,7 @@
 //
 // A host compares each of its references with each endpoint, so this allocates nothing once the
 // texts below have grown to the length of the studio's names.
+#include "core/PerThread.h"
 #include "matching/SavedEndpoint.h"
 #include "model/Handles.h"
 #include "model/PropertyKeys.h"
@@ -19,19 +20,30 @@ using Impl::EndpointImpl;
 using Impl::SavedEndpoint;
 namespace Keys = Impl::Keys;
 
+// Texts of this thread that keep their room from one comparison to the next.
+struct Texts {
+  UString decoded;
+  UString live;
+};
+
+Texts& TheTexts() {
+  static PerThread<Texts> sTexts;
+  return *sTexts;
+}
+
 enum class Likeness { kDifferent, kLoose, kExact };
 
 Likeness Compare(EncodedText const& saved, UString const& live) {
   if (saved.Equals(live)) {
     return Likeness::kExact;
   }
-  thread_local UString decoded;
+  UString& decoded = TheTexts().decoded;
   saved.DecodeTo(decoded);
   return decoded.equal(live, UString::kLooselyEqual) ? Likeness::kLoose : Likeness::kDifferent;
 }
 
 Likeness CompareProperty(EncodedText const& saved, EndpointImpl const& live, UString const& key) {
-  thread_local UString text;
+  UString& text = TheTexts().live;
   text.clear();
   live.Peer()->GetString(key, text);
   return Compare(saved, text);
@@ -48,7 +60,7 @@ void RankUniqueID(SavedEndpoint const& saved, EndpointImpl const& live, ObjectMa
 }
 
 void RankName(SavedEndpoint const& saved, EndpointImpl const& live, ObjectMatch& match) {
-  thread_local UString name;
+  UString& name = TheTexts().live;
   name.clear();
   if (saved.nameIsFull) {
     name = live.NameToShow();

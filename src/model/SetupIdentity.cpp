@@ -59,31 +59,24 @@ void Setup::MaybeAssignUniqueID(Impl::DeviceObjectImpl& object) {
   if (object.Peer()->GetInt(Keys::kUniqueID, id)) {
     return;
   }
-  // Read once, at the first number drawn that looks taken.
-  std::unordered_set<int> used;
-  auto const isFree = [&](int candidate) {
-    if (!Impl::IsUniqueIDStored(candidate)) {
-      return true;
-    }
-    if (used.empty()) {
-      AnyObject(GetStudio(), [&](Impl::DeviceObjectImpl const& other) {
-        used.insert(other.GetInt(Keys::kUniqueID, 0));
-        return false;
-      });
-    }
-    return used.count(candidate) == 0;
-  };
+  // A number that any store holds is passed over, be its object in the studio or not: that needs no
+  // walk over the studio, even where `rand` has few numbers and so repeats itself often.
   constexpr int kDraws = 100000;
   for (int draw = 0; draw < kDraws; ++draw) {
     int const drawn = std::rand();
-    if (drawn != 0 && isFree(drawn)) {
+    if (drawn != 0 && !Impl::IsUniqueIDStored(drawn)) {
       object.Peer()->SetInt(Keys::kUniqueID, drawn);
       return;
     }
   }
   // Where the numbers of rand are all in use.
+  std::unordered_set<int> used;
+  AnyObject(GetStudio(), [&](Impl::DeviceObjectImpl const& other) {
+    used.insert(other.GetInt(Keys::kUniqueID, 0));
+    return false;
+  });
   id = 1;
-  while (!isFree(id)) {
+  while (used.count(id) != 0) {
     ++id;
   }
   object.Peer()->SetInt(Keys::kUniqueID, id);

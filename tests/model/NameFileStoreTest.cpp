@@ -58,7 +58,9 @@ TEST_F(NameFileStoreTest, TheBlockIsLittleEndian) {
   store.Load();
   store.AddUses(FileSpecification(UString(u"/\u4e2d")), 1);
   store.Save();
-  EXPECT_THAT(prefs.blocks[0], ElementsAre(1, 0, 0, 0, 1, 0, 0, 0, 2, 0, 0, 0, '/', 0, 0x2d, 0x4e));
+  auto const separator = static_cast<unsigned char>(SystemPath("/")[0]);
+  EXPECT_THAT(prefs.blocks[0],
+              ElementsAre(1, 0, 0, 0, 1, 0, 0, 0, 2, 0, 0, 0, separator, 0, 0x2d, 0x4e));
 }
 
 TEST_F(NameFileStoreTest, ABlockOfAnotherVersionIsIgnored) {

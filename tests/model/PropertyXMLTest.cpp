@@ -54,7 +54,7 @@ TEST_F(PropertyXMLTest, EachKindHasItsElement) {
   peer.SetIntList("l", {1, -2});
   PropertyDict dict;
   dict.entries["d"] = PropertyDict();
-  dict.entries["f"] = PropertyPath{"/no/such"};
+  dict.entries["f"] = PropertyPath{SystemPath("/no/such")};
   dict.entries["s"] = UString("x");
   dict.entries["t"] = std::vector<UString>{"a", "b"};
   peer.SetDict("d", dict);
@@ -64,7 +64,8 @@ TEST_F(PropertyXMLTest, EachKindHasItsElement) {
   EXPECT_THAT(xml, HasSubstr("<String key=\"s\">text &amp; &lt;more"));
   EXPECT_THAT(xml, HasSubstr("<IntItem>-2</IntItem>"));
   EXPECT_THAT(xml, HasSubstr("<StringItem>b</StringItem>"));
-  EXPECT_THAT(xml, HasSubstr("<Path type=\"Absolute\">/no/such</Path>"));
+  EXPECT_THAT(xml,
+              HasSubstr("<Path type=\"Absolute\">" + SystemPath("/no/such").string() + "</Path>"));
   EXPECT_LT(xml.find("<Dict key=\"d\""), xml.find("<File key=\"f\""));  // in key order
   EXPECT_LT(xml.find("<File key=\"f\"", xml.find("</Dict>")), xml.find("<Int key=\"i\""));
   Read(xml, back);
@@ -181,7 +182,7 @@ TEST_F(PropertyXMLTest, APathInTheHostsFolderIsWrittenRelativeToIt) {
 }
 
 TEST_F(PropertyXMLTest, AFileThatDoesNotExistIsWrittenWithItsFullPath) {
-  UString const path = prefs.FolderPath() + "/gone.midnam";
+  UString const path = prefs.FolderPath() + SystemPath("/gone.midnam");
   peer.SetFile("f", path);
   EXPECT_THAT(Write(peer), HasSubstr("<Path type=\"Absolute\">"));
   Read(Write(peer), back);
@@ -256,7 +257,7 @@ class RandomStore {
     }
     return text;
   }
-  UString Path() { return Pick(3) == 0 ? UString() : UString("/no/such/") + Text() + "x"; }
+  UString Path() { return Pick(3) == 0 ? UString() : SystemPath("/no/such/") + Text() + "x"; }
   PropertyDict Dict(int depth) {
     PropertyDict dict;
     for (int i = Pick(4); i > 0; --i) {

@@ -37,20 +37,20 @@ inline std::string NameDocument(std::string const& content, std::string const& a
          "</MIDINameDocument>";
 }
 
-inline std::string Device(std::string const& manufacturer, std::string const& model) {
+inline std::string DeviceText(std::string const& manufacturer, std::string const& model) {
   return "<Manufacturer>" + manufacturer + "</Manufacturer><Model>" + model + "</Model>";
 }
 
 /// The names of one model.
 inline std::string Master(std::string const& manufacturer, std::string const& model,
                           std::string const& content = "") {
-  return "<MasterDeviceNames>" + Device(manufacturer, model) + content + "</MasterDeviceNames>";
+  return "<MasterDeviceNames>" + DeviceText(manufacturer, model) + content + "</MasterDeviceNames>";
 }
 
 /// Patch lists for the banks of one model.
 inline std::string Extender(std::string const& manufacturer, std::string const& model,
                             std::string const& content = "") {
-  return "<ExtendingDeviceNames>" + Device(manufacturer, model) + content +
+  return "<ExtendingDeviceNames>" + DeviceText(manufacturer, model) + content +
          "</ExtendingDeviceNames>";
 }
 

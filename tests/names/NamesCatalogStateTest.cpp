@@ -200,7 +200,7 @@ TEST_F(NamesCatalogStateTest, NoChangedByteReadsOutsideTheBlock) {
   catalog.SaveState(prefs);
   Bytes const whole = prefs.blocks[kBlock];
   for (std::size_t place = 0; place < whole.size(); ++place) {
-    for (unsigned char const value : {0x00, 0x01, 0x7F, 0xFF}) {
+    for (unsigned char const value : Bytes{0x00, 0x01, 0x7F, 0xFF}) {
       prefs.blocks[kBlock] = whole;
       prefs.blocks[kBlock][place] = value;
       ASSERT_NO_THROW(catalog.LoadState(prefs)) << place;

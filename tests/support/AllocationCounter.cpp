@@ -5,9 +5,31 @@
 #include <cstdlib>
 #include <new>
 
+// The thread sanitizer has these operators itself, and lets a program look on.
+#if defined(__has_feature)
+#if __has_feature(thread_sanitizer)
+#define OSTINET_HOOKED_ALLOCATOR 1
+#include <sanitizer/allocator_interface.h>
+#endif
+#endif
+
 namespace {
 
 std::atomic<std::size_t> gAllocations{0};
+
+#if OSTINET_HOOKED_ALLOCATOR
+
+void CountAllocation(void const volatile*, std::size_t) {
+  gAllocations.fetch_add(1, std::memory_order_relaxed);
+}
+void IgnoreRelease(void const volatile*) {}
+
+[[maybe_unused]] int const gHooks =
+    __sanitizer_install_malloc_and_free_hooks(CountAllocation, IgnoreRelease);
+
+}  // namespace
+
+#else
 
 void* TryToAllocate(std::size_t size) noexcept {
   gAllocations.fetch_add(1, std::memory_order_relaxed);
@@ -34,6 +56,8 @@ void operator delete(void* memory) noexcept { std::free(memory); }
 void operator delete[](void* memory) noexcept { std::free(memory); }
 void operator delete(void* memory, std::size_t) noexcept { std::free(memory); }
 void operator delete[](void* memory, std::size_t) noexcept { std::free(memory); }
+
+#endif
 
 namespace Ostinet::Testing {
 

@@ -57,6 +57,9 @@ class RecordingReceiver : public Receiver {
   std::vector<std::pair<Source, std::vector<unsigned char>>> packets;
 };
 
+/// `path` with the separators that the system writes.
+UString SystemPath(UString const& path);
+
 /// Keeps blocks in memory, and files in a folder of its own that goes with it.
 class MemoryPrefs : public PrefsHandler {
  public:

@@ -118,10 +118,21 @@ TEST(SystemWaitsThreads, ATimerThatIsSetEarlierWakesItsWaiter) {
 TEST(SystemWaitsThreads, ErrorsBelongToTheirThread) {
   auto const waits = MakeSystemWaits();
   HANDLE const semaphore = waits->CreateSemaphoreW(1, 1);
+  // Making or joining a thread may itself set this thread's error: neither happens in between.
+  std::atomic<bool> mayFail{false};
+  std::atomic<bool> hasFailed{false};
+  std::thread other([&] {
+    while (!mayFail) {
+    }
+    waits->CloseHandle(nullptr);
+    hasFailed = true;
+  });
   EXPECT_FALSE(waits->ReleaseSemaphore(semaphore, 1));
-  std::thread other([&] { waits->CloseHandle(nullptr); });
-  other.join();
+  mayFail = true;
+  while (!hasFailed) {
+  }
   EXPECT_EQ(waits->GetLastError(), 298u);
+  other.join();
   waits->CloseHandle(semaphore);
 }
 

@@ -34,13 +34,23 @@ class Tables:
                                  (int(row["First"], 16), int(row["Last"], 16)))
         return found
 
+    def also_answers(self):
+        """{(maker, model cell of a row of detect): other (maker, model) that answer it as well}."""
+        return {(row["Manufacturer"], row["Row"]):
+                [(row["Manufacturer"], model) for model in row["Models"].split("|")]
+                for row in self.rows("also_answers")}
+
+    @staticmethod
+    def identity(row):
+        """What a row of inquiry tells: maker's bytes, family and member, as texts."""
+        return (row["ManufacturerID"], row["Family (wire order)"], row["Member (wire order)"])
+
     def identities(self):
         """{(maker, model): (maker's bytes, family, member)}, texts as in an inquiry's reply. The
         first row of a model counts; rows with unknown bytes do not."""
         found = {}
         for row in self.rows("inquiry"):
-            identity = (row["ManufacturerID"], row["Family (wire order)"],
-                        row["Member (wire order)"])
+            identity = self.identity(row)
             if not any(UNKNOWN_BYTE in part for part in identity):
                 for model in self.models(row):
                     found.setdefault((row["Manufacturer"], model), identity)
@@ -50,8 +60,7 @@ class Tables:
         """The identities that more than one model answers with, whatever its revision."""
         makers = {}
         for row in self.rows("inquiry"):
-            identity = (row["ManufacturerID"], row["Family (wire order)"],
-                        row["Member (wire order)"])
+            identity = self.identity(row)
             makers.setdefault(identity, set()).update(
                 (row["Manufacturer"], model) for model in self.models(row))
         return {identity for identity, models in makers.items() if len(models) > 1}

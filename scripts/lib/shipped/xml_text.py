@@ -31,6 +31,19 @@ class Element:
             yield f"{indent}</{self.name}>"
 
 
+class Mixed:
+    """An element of words and elements without content, on one line."""
+
+    def __init__(self, name, content):
+        self.name = name
+        self.content = list(content)
+
+    def lines(self, indent=""):
+        words = " ".join(escape(each) if isinstance(each, str) else "".join(each.lines())
+                         for each in self.content)
+        yield f"{indent}<{self.name}>{words}</{self.name}>"
+
+
 def document(root, prolog=()):
     """The whole file. `prolog`: lines of its own, as a DOCTYPE."""
     lines = ['<?xml version="1.0" encoding="UTF-8"?>', "<!-- SPDX-License-Identifier: MIT -->",

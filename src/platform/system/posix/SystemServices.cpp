@@ -10,6 +10,7 @@
 #include <cerrno>
 #include <cstdio>
 #include <cstdlib>
+#include <new>
 #include <string>
 
 namespace Ostinet::SystemServices {
@@ -102,6 +103,22 @@ void NameThisThread(UString const& name, int) {
   static_cast<void>(::pthread_setname_np(::pthread_self(), text.c_str()));
 }
 
+ThreadSlot::ThreadSlot(void (*free)(void*)) {
+  pthread_key_t key = 0;
+  if (::pthread_key_create(&key, free) != 0) {
+    throw std::bad_alloc();
+  }
+  key_ = key;
+}
+
+void* ThreadSlot::Get() const { return ::pthread_getspecific(static_cast<pthread_key_t>(key_)); }
+
+void ThreadSlot::Set(void* pointer) {
+  if (::pthread_setspecific(static_cast<pthread_key_t>(key_), pointer) != 0) {
+    throw std::bad_alloc();
+  }
+}
+
 OutputFile::~OutputFile() { Close(); }
 
 int OutputFile::Create(std::filesystem::path const& path) {
@@ -158,5 +175,7 @@ int RenameOver(std::filesystem::path const& from, std::filesystem::path const& t
 }
 
 unsigned long ProcessNumber() { return static_cast<unsigned long>(::getpid()); }
+
+bool IsErrorOutputATerminal() { return ::isatty(STDERR_FILENO) == 1; }
 
 }  // namespace Ostinet::SystemServices

@@ -4,6 +4,8 @@
 #include <algorithm>
 #include <vector>
 
+#include "core/PerThread.h"
+
 namespace Ostinet::Impl::Simulated {
 
 namespace {
@@ -19,7 +21,10 @@ struct Membership {
   }
 };
 
-thread_local Membership sMembership;
+Membership& TheMembership() {
+  static PerThread<Membership> sMembership;
+  return *sMembership;
+}
 
 }  // namespace
 
@@ -28,7 +33,7 @@ void SimulatedWaits::Registry::Enter() {
     std::lock_guard lock(mutex_);
     if (!entries_.try_emplace(std::this_thread::get_id()).second) return;
   }
-  auto& registries = sMembership.registries;
+  auto& registries = TheMembership().registries;
   registries.erase(std::remove_if(registries.begin(), registries.end(),
                                   [](auto const& each) { return each.expired(); }),
                    registries.end());

@@ -4,6 +4,7 @@
 #include <windows.h>
 
 #include <algorithm>
+#include <new>
 #include <string>
 #include <vector>
 
@@ -95,6 +96,21 @@ void NameThisThread(UString const& name, int priority) {
   }
 }
 
+ThreadSlot::ThreadSlot(void (*free)(void*))
+    : key_(::FlsAlloc(reinterpret_cast<PFLS_CALLBACK_FUNCTION>(free))) {
+  if (key_ == FLS_OUT_OF_INDEXES) {
+    throw std::bad_alloc();
+  }
+}
+
+void* ThreadSlot::Get() const { return ::FlsGetValue(key_); }
+
+void ThreadSlot::Set(void* pointer) {
+  if (::FlsSetValue(key_, pointer) == 0) {
+    throw std::bad_alloc();
+  }
+}
+
 OutputFile::~OutputFile() { Close(); }
 
 int OutputFile::Create(std::filesystem::path const& path) {
@@ -141,5 +157,10 @@ int RenameOver(std::filesystem::path const& from, std::filesystem::path const& t
 }
 
 unsigned long ProcessNumber() { return ::GetCurrentProcessId(); }
+
+bool IsErrorOutputATerminal() {
+  DWORD mode = 0;
+  return ::GetConsoleMode(::GetStdHandle(STD_ERROR_HANDLE), &mode) != 0;
+}
 
 }  // namespace Ostinet::SystemServices
