@@ -7,6 +7,7 @@
 #include "Lookup.h"
 #include "Output.h"
 #include "StudioEditing.h"
+#include "TypeLookup.h"
 
 namespace Ostinet::Tool {
 namespace {
@@ -22,26 +23,22 @@ struct DeviceOptions {
   std::optional<int> outputs;
 };
 
-DeviceTypeInfo FindType(std::string const& maker, std::string const& model) {
-  DeviceTypeInfo const type =
-      DeviceTypeCatalog::Instance().GetDeviceType(UString(maker), UString(model));
-  if (!type.Exists()) {
-    throw Failure("there is no device type \"" + model + "\" by \"" + maker +
-                  "\"; see ostinet types");
-  }
-  return type;
-}
-
 void New(GlobalOptions const& globals, DeviceOptions const& options) {
   UString const name = NewName(options.name, "device");
+  bool const isTyped = !options.maker.empty();
+  DeviceTypeInfo const type =
+      isTyped ? FindDeviceType(options.maker, options.model) : DeviceTypeInfo();
   Session session(globals, nullptr, nullptr);
   Setup& setup = session.GetSetup();
-  bool const isTyped = !options.maker.empty();
-  Device const device = isTyped ? setup.CreateDevice(FindType(options.maker, options.model), name)
-                                : setup.CreateDevice(name);
-  if (options.inputs || options.outputs) {
-    setup.SetEntitySources(device.GetEntity(0), options.inputs.value_or(1));
-    setup.SetEntityDestinations(device.GetEntity(0), options.outputs.value_or(1));
+  Device const device = setup.CreateDevice(name);
+  if (isTyped) {
+    setup.ChangeDeviceType(device, type);
+  }
+  if (options.inputs) {
+    setup.SetEntitySources(device.GetEntity(0), *options.inputs);
+  }
+  if (options.outputs) {
+    setup.SetEntityDestinations(device.GetEntity(0), *options.outputs);
   }
   NamedObject const made = Named(device);
   session.Save();
@@ -80,9 +77,9 @@ void Rename(GlobalOptions const& globals, DeviceOptions const& options) {
 }
 
 void ChangeType(GlobalOptions const& globals, DeviceOptions const& options) {
+  DeviceTypeInfo const type = FindDeviceType(options.maker, options.model);
   Session session(globals, nullptr, nullptr);
-  Device const device = FindDevice(session.GetSetup(), options.device);
-  session.GetSetup().ChangeDeviceType(device, FindType(options.maker, options.model));
+  session.GetSetup().ChangeDeviceType(FindDevice(session.GetSetup(), options.device), type);
   session.Save();
 }
 

@@ -53,7 +53,7 @@ struct DrawnDevice {
   std::string type;  ///< manufacturer and model
   DrawnBox box;
   bool onLeft = false;
-  bool online = false;
+  bool online = false;  ///< an end hangs on a port that is online
   bool connected = false;
   int hue = -1;  ///< of its first port; -1 for none
   std::vector<DrawnEnds> ends;

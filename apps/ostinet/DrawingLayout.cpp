@@ -26,6 +26,7 @@ constexpr double kCableRoom = 210;
 constexpr double kPortHeight = 30;
 constexpr double kPortPitch = 36;
 constexpr double kWidestPitch = 64;
+constexpr double kEar = 5;        // by which a row stands out of the rack
 constexpr double kRackEdge = 44;  // its heading
 constexpr double kRackFoot = 12;
 constexpr double kSoftwareGap = 26;
@@ -115,6 +116,13 @@ struct Card {
   }
 };
 
+// Without the name of the device, which stands above it.
+std::string OwnName(EntityView const& entity, DeviceView const& device) {
+  std::string const front = device.name + " ";
+  bool const isFront = entity.name.compare(0, front.size(), front) == 0;
+  return isFront ? entity.name.substr(front.size()) : entity.name;
+}
+
 class Layout {
  public:
   explicit Layout(StudioView const& studio) : ports_(PortsOf(studio)), rows_(RowsByKey(ports_)) {
@@ -151,7 +159,6 @@ class Layout {
     card.drawn.name = view.name;
     card.drawn.type = view.manufacturer;
     card.drawn.type += (view.manufacturer.empty() || view.model.empty() ? "" : " ") + view.model;
-    card.drawn.online = view.online;
     for (EntityView const& entity : view.entities) {
       AddEnds(entity, view.entities.size() > 1, card);
     }
@@ -171,7 +178,7 @@ class Layout {
       ends.hasSource = i < entity.sources.size();
       ends.hasDestination = i < entity.destinations.size();
       if (hasSiblings || lines > 1) {
-        ends.label = entity.name + (lines > 1 ? " · " + std::to_string(i + 1) : "");
+        ends.label = OwnName(entity, *card.view) + (lines > 1 ? " · " + std::to_string(i + 1) : "");
       }
       card.drawn.ends.push_back(ends);
       if (ends.hasSource) {
@@ -187,6 +194,7 @@ class Layout {
     auto const row = rows_.find(end.portKey);
     if (end.portKey != 0 && row != rows_.end()) {
       card.rows.push_back(row->second);
+      card.drawn.online = card.drawn.online || end.online;
     }
   }
 
@@ -218,7 +226,8 @@ class Layout {
     int hue = 0;
     for (std::size_t i = 0; i < ports_.size(); ++i) {
       y += hasBoth && i > 0 && ports_[i].software && !ports_[i - 1].software ? gap : 0;
-      ports_[i].box = {rack_.x + 12, y + (pitch - kPortHeight) / 2, rack_.width - 24, kPortHeight};
+      ports_[i].box = {rack_.x - kEar, y + (pitch - kPortHeight) / 2, rack_.width + 2 * kEar,
+                       kPortHeight};
       ports_[i].hue = ports_[i].used ? hue++ % kHues : 0;
       y += pitch;
     }

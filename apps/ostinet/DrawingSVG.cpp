@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: MIT
+#include <algorithm>
 #include <array>
 #include <cmath>
+#include <locale>
 #include <sstream>
 
 #include "Drawing.h"
@@ -22,8 +24,8 @@ constexpr char kStyle[] = R"(
   .type, .ends { font-size: 11.5px; fill: #6b7280; }
   .port { font-size: 12.5px; fill: #111827; text-anchor: middle; }
   .rack { fill: #1f2937; }
-  .row { fill: #f8fafc; }
-  .software { fill: #e0e7ff; }
+  .row { fill: #f8fafc; stroke: #cbd5e1; stroke-width: 1; }
+  .software { fill: #e0e7ff; stroke: #c7d2fe; }
   .unused { opacity: 0.62; }
   .card { fill: #ffffff; stroke: #d7dde5; stroke-width: 1; }
   .off { opacity: 0.5; }
@@ -31,7 +33,7 @@ constexpr char kStyle[] = R"(
   .halo { fill: none; stroke: #f6f7f9; stroke-width: 5.5; }
   .legend { font-size: 12px; fill: #6b7280; })";
 
-constexpr double kLetterWidth = 0.56;  // of the size of the letters, on the average
+constexpr double kLetterWidth = 0.54;  // of the size of the letters, on the average
 
 std::string Number(double value) {
   std::ostringstream text;
@@ -92,9 +94,7 @@ class Document {
          << "<rect width=\"100%\" height=\"100%\" fill=\"#f6f7f9\"/>\n";
     Title();
     Rack();
-    for (DrawnCable const& cable : drawing_.cables) {
-      Cable(cable);
-    }
+    Cables();
     for (DrawnPort const& port : drawing_.ports) {
       Port(port);
     }
@@ -150,11 +150,16 @@ class Document {
   }
   void Close() { out_ << "</g>\n"; }
 
-  // Filled where something hangs on it.
-  void Jack(double x, double y, bool used, int hue) {
-    char const* const colour = kColours[static_cast<std::size_t>(hue)];
+  // Filled where a cable ends in it.
+  void Jack(double x, double y) {
+    auto const cable =
+        std::find_if(drawing_.cables.begin(), drawing_.cables.end(), [&](DrawnCable const& one) {
+          return (one.x1 == x && one.y1 == y) || (one.x2 == x && one.y2 == y);
+        });
+    bool const used = cable != drawing_.cables.end();
+    char const* const colour = used ? kColours[static_cast<std::size_t>(cable->hue)] : "#ffffff";
     out_ << "<circle cx=\"" << Number(x) << "\" cy=\"" << Number(y) << "\" r=\"3.6\" fill=\""
-         << (used ? colour : "#ffffff") << "\" stroke=\"" << (used ? "#ffffff" : "#94a3b8")
+         << colour << "\" stroke=\"" << (used ? "#ffffff" : "#94a3b8")
          << "\" stroke-width=\"1.2\"/>\n";
   }
 
@@ -169,13 +174,13 @@ class Document {
              (port.online ? "" : ", offline") + ")");
     Box(port.box, port.software ? "row software" : "row", 6);
     Text(port.box.x + port.box.width / 2, port.box.y + port.box.height / 2 + 4.5, "port",
-         Shortened(port.name, port.box.width - 24, 12.5));
+         Shortened(port.name, port.box.width - 28, 12.5));
     for (double const x : {port.box.x, port.box.Right()}) {
       if (port.source != 0) {
-        Jack(x, port.SourceY(), port.used, port.hue);
+        Jack(x, port.SourceY());
       }
       if (port.destination != 0) {
-        Jack(x, port.DestinationY(), port.used, port.hue);
+        Jack(x, port.DestinationY());
       }
     }
     Close();
@@ -209,24 +214,43 @@ class Document {
     if (!ends.label.empty()) {
       Text(textX, ends.y + 4, "ends", Shortened(ends.label, device.box.width - 40, 11.5));
     }
-    int const hue = std::max(device.hue, 0);
     if (ends.hasSource) {
-      Jack(device.JackX(), ends.SourceY(), device.connected, hue);
+      Jack(device.JackX(), ends.SourceY());
     }
     if (ends.hasDestination) {
-      Jack(device.JackX(), ends.DestinationY(), device.connected, hue);
+      Jack(device.JackX(), ends.DestinationY());
     }
   }
 
-  void Cable(DrawnCable const& cable) {
+  static std::string PathOf(DrawnCable const& cable) {
     double const bend = (cable.x2 - cable.x1) * 0.5;
-    std::ostringstream path;
-    path << "d=\"M" << Number(cable.x1) << " " << Number(cable.y1) << "C" << Number(cable.x1 + bend)
-         << " " << Number(cable.y1) << " " << Number(cable.x2 - bend) << " " << Number(cable.y2)
-         << " " << Number(cable.x2) << " " << Number(cable.y2) << "\"";
-    out_ << "<path class=\"halo\" " << path.str() << "/>\n<path class=\"cable\" stroke=\""
-         << kColours[static_cast<std::size_t>(cable.hue)] << "\""
-         << (cable.online ? "" : " stroke-dasharray=\"2 6\"") << " " << path.str() << "/>\n";
+    return "d=\"M" + Number(cable.x1) + " " + Number(cable.y1) + "C" + Number(cable.x1 + bend) +
+           " " + Number(cable.y1) + " " + Number(cable.x2 - bend) + " " + Number(cable.y2) + " " +
+           Number(cable.x2) + " " + Number(cable.y2) + "\"";
+  }
+
+  void Halo(DrawnCable const& cable) { out_ << "<path class=\"halo\" " << PathOf(cable) << "/>\n"; }
+
+  void Cable(DrawnCable const& cable) {
+    out_ << "<path class=\"cable\" stroke=\"" << kColours[static_cast<std::size_t>(cable.hue)]
+         << "\"" << (cable.online ? "" : " stroke-dasharray=\"2 6\"") << " " << PathOf(cable)
+         << "/>\n";
+  }
+
+  // A halo sets cables off from those that they cross, but not from those of their own port.
+  void Cables() {
+    for (int hue = 0; hue < kHues; ++hue) {
+      for (DrawnCable const& cable : drawing_.cables) {
+        if (cable.hue == hue) {
+          Halo(cable);
+        }
+      }
+      for (DrawnCable const& cable : drawing_.cables) {
+        if (cable.hue == hue) {
+          Cable(cable);
+        }
+      }
+    }
   }
 
   // At its end, pointing the way that MIDI goes.

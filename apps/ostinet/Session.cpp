@@ -111,6 +111,9 @@ Session::Session(GlobalOptions const& options, Receiver* receiver, SetupListener
   if (!why.empty()) {
     Notify(why);
   }
+  if (prefs_ != nullptr) {
+    virtualEndpoints_.Load(FileInSettings(kVirtualEndpointsFile));
+  }
   SignIn(receiver, listener);
 }
 
@@ -122,10 +125,7 @@ void Session::SignIn(Receiver* receiver, SetupListener* listener) {
     throw Failure(SignInSentence(result));
   }
   setup.SetListener(listener);
-  if (prefs_ != nullptr) {
-    virtualEndpoints_.Load(FileInSettings(kVirtualEndpointsFile));
-    virtualEndpoints_.Make(setup);
-  }
+  virtualEndpoints_.Make(setup);
 }
 
 File Session::FileInSettings(char const* name) const {

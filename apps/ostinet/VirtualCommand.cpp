@@ -10,6 +10,7 @@ namespace {
 
 struct VirtualOptions {
   std::string name;
+  bool input = false;  // the default, which may be said
   bool output = false;
 };
 
@@ -46,7 +47,8 @@ void AddVirtualCommand(CLI::App& app, CommandLine& line) {
   };
   CLI::App* const make = add("new", "Make a pair of ends", New);
   make->add_flag("-o,--output", options->output, "Its output shows, what MIDI goes to");
-  make->add_flag("-i,--input", "Its input shows, what MIDI comes from (the default)")
+  make->add_flag("-i,--input", options->input,
+                 "Its input shows, what MIDI comes from (the default)")
       ->excludes("--output");
   add("delete", "Delete both ends", Delete);
 }

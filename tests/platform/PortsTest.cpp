@@ -147,6 +147,7 @@ TEST_F(DirectMusicPort, AnOutputDoesNotExistOnceItIsDeactivated) {
   EXPECT_EQ(midi.CountObjects("IDirectMusicPort"), 1) << "the port is still there";
   EXPECT_FALSE(held.Exists());
   held.SetModel(UString("x"));
+  midi.SetStepPerReading(1);
   SignIn();
   midi.SetStepPerReading(0);
   setup.PollSetupChanges();

@@ -2,6 +2,7 @@
 
 #include <stdexcept>
 
+#include "model/EndpointImpl.h"
 #include "ostinet/SysexRef.h"
 #include "platform/PlatformTest.h"
 
@@ -326,6 +327,39 @@ TEST_F(VirtualPair, ItsEndsShareTheirProperties) {
   EXPECT_EQ(source.GetManufacturer(), UString("Acme"));
   EXPECT_EQ(source.GetName(), UString("Bus"));
   EXPECT_EQ(destination.GetName(), UString("Bus"));
+}
+
+TEST_F(VirtualPair, RemovingAPropertyOnEitherEndRemovesItOnBoth) {
+  source.SetManufacturer(UString("Acme"));
+  Impl::ImplImpl& end =
+      *static_cast<Impl::EndpointImpl*>(static_cast<Impl::ObjectImpl*>(destination.GetImplPtr()))
+           ->Peer();
+  end.RemoveProperty("manufacturer");
+  EXPECT_EQ(source.GetManufacturer(), UString());
+  EXPECT_TRUE(end.IsFake());
+  EXPECT_FALSE(end.IsPregen());
+  EXPECT_EQ(end.GetSynapMIDIPort(), nullptr);
+}
+
+// Whoever still holds the destination may go on writing to it.
+TEST_F(VirtualPair, ADestinationWhoseSourceWentFirstKeepsItsOwnProperties) {
+  setup.DeleteVirtualEndpoint(source);
+  source = Source();
+  setup.PollSetupChanges();  // which lets go of what it had noted
+  ASSERT_EQ(destination.GetRawName(), UString());
+  destination.SetRawName(UString("Left over"));
+  EXPECT_EQ(destination.GetRawName(), UString("Left over"));
+  Send(destination, {0x90, 60, 64});
+  destination.FlushOutput();
+  setup.ProcessInput();
+  EXPECT_THAT(receiver.packets, IsEmpty());
+}
+
+TEST_F(VirtualPair, FlushingTakesNothingBack) {
+  Send(destination, {0x90, 60, 64});
+  destination.FlushOutput();
+  setup.ProcessInput();
+  EXPECT_EQ(receiver.packets.size(), 1u);
 }
 
 TEST_F(VirtualPair, IsDeletedByEitherEnd) {
