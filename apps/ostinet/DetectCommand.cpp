@@ -207,7 +207,7 @@ void AddDetectCommand(CLI::App& app, CommandLine& line) {
       ->add_option("--timeout", options->timeout,
                    "At most so many seconds for each port; without it, as many as it takes")
       ->type_name("SECONDS")
-      ->check(CLI::PositiveNumber);
+      ->check(CLI::Range(0.1, 3600.0));
   command->add_flag("--create", options->create,
                     "Make a device of the right type for each instrument, on its port");
   command->footer(
