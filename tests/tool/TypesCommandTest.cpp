@@ -102,7 +102,7 @@ TEST_F(Types, TellsWhatOfAFileWouldBeSkipped) {
                           HasSubstr(none + ":0: the file cannot be read: ")));
   EXPECT_THAT(run.err, HasSubstr("not all of it would be read"));
 
-  json const files = json::parse(Run({"types", "--json", "--check", bad}).out)["files"];
+  json const files = json::parse(Run({"types", "--check", "--json", bad}).out)["files"];
   ASSERT_THAT(files, SizeIs(1));
   EXPECT_EQ(files[0]["file"], bad);
   EXPECT_EQ(files[0]["author"], "");
@@ -114,7 +114,6 @@ TEST_F(Types, TellsWhatOfAFileWouldBeSkipped) {
 TEST_F(Types, WrongUsageEndsWithTwo) {
   EXPECT_EQ(Run({"types", "a", "b", "c"}).exitCode, kUsage);
   EXPECT_EQ(Run({"types", "--check"}).exitCode, kUsage);
-  EXPECT_EQ(Run({"types", "Roland", "--check", "a.middev"}).exitCode, kUsage);
 }
 
 }  // namespace
