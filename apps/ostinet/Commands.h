@@ -43,6 +43,7 @@ void AddSelectCommand(CLI::App& app, CommandLine& line);
 void AddModeCommand(CLI::App& app, CommandLine& line);
 void AddNoteNameCommand(CLI::App& app, CommandLine& line);
 void AddTypesCommand(CLI::App& app, CommandLine& line);
+void AddNamesCommand(CLI::App& app, CommandLine& line);
 
 /// Adds --for and --count.
 void AddLimits(CLI::App& command, Limits& limits);

@@ -11,9 +11,8 @@ namespace Ostinet::Tool {
 namespace {
 
 struct TypesOptions {
-  std::string maker;
-  std::string model;
-  std::vector<std::string> files;
+  std::vector<std::string> words;  // a maker and a model, or files to check
+  bool check = false;
 };
 
 void Print(bool asJSON, std::string const& json, std::vector<std::string> const& lines) {
@@ -26,21 +25,21 @@ void Print(bool asJSON, std::string const& json, std::vector<std::string> const&
   }
 }
 
-void ListTypes(bool asJSON, TypesOptions const& options) {
+void ListTypes(bool asJSON, std::vector<std::string> const& words) {
   DeviceTypeCatalog const& catalog = DeviceTypeCatalog::Instance();
   MakerCounts const makers = MakersOf(catalog);
-  if (options.maker.empty()) {
+  if (words.empty()) {
     Print(asJSON, MakersJSON(makers), MakerLines(makers));
     return;
   }
-  std::string const maker = FindMaker(makers, options.maker);
+  std::string const maker = FindMaker(makers, words[0]);
   std::vector<DeviceTypeInfo> types;
   catalog.CollectModels(UString(maker), types);
-  if (options.model.empty()) {
+  if (words.size() == 1) {
     Print(asJSON, ModelsJSON(maker, types), ModelLines(types));
     return;
   }
-  DeviceTypeInfo const type = FindModel(types, options.model);
+  DeviceTypeInfo const type = FindModel(types, words[1]);
   Print(asJSON, TypeJSON(type), TypeLines(type));
 }
 
@@ -61,12 +60,17 @@ void CheckFiles(bool asJSON, std::vector<std::string> const& paths) {
 }
 
 void Types(GlobalOptions const& globals, TypesOptions const& options) {
-  if (options.files.empty()) {
-    ListTypes(globals.json, options);
-  } else if (options.maker.empty()) {
-    CheckFiles(globals.json, options.files);
+  constexpr size_t kMakerAndModel = 2;
+  if (options.check && options.words.empty()) {
+    throw UsageError("name the files to check");
+  }
+  if (!options.check && options.words.size() > kMakerAndModel) {
+    throw UsageError("name a maker and a model; a name with blanks goes in quotes");
+  }
+  if (options.check) {
+    CheckFiles(globals.json, options.words);
   } else {
-    throw UsageError("--check takes files, and no maker");
+    ListTypes(globals.json, options.words);
   }
 }
 
@@ -76,13 +80,10 @@ void AddTypesCommand(CLI::App& app, CommandLine& line) {
   auto const options = std::make_shared<TypesOptions>();
   CLI::App* const command =
       app.add_subcommand("types", "Show the makers, models and facts of the device types");
-  command->add_option("maker", options->maker, "List the models of this maker");
-  command->add_option("model", options->model, "Show what is known of this model");
-  command
-      ->add_option("--check", options->files,
-                   "Tell what of these device type files would be skipped, and why")
-      ->type_name("FILE")
-      ->expected(1, -1);
+  command->add_option("words", options->words, "A maker, or a maker and a model")
+      ->type_name("[MAKER [MODEL]]");
+  command->add_flag("--check", options->check,
+                    "Take the words for device type files, and tell what of them would be skipped");
   command->callback(
       [&line, options] { line.run = [&line, options] { Types(line.options, *options); }; });
 }

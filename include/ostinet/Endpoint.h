@@ -213,21 +213,43 @@ class OSTINET_EXPORT Destination : public Endpoint {
   /// By how many seconds the host should stamp its output ahead. Default: 0.
   double GetAdvanceScheduleTime() const;
 
-  /// What the destination's modes, banks and patches are called. Channels are 0 to 15.
+  // What the destination's modes, banks and patches are called. Channels are 0 to 15; out of range,
+  // and where nothing is known, there is a null handle. Names stay until other ones are chosen, by
+  // SetNames or because the device became another; DestinationNamesChanged tells that.
+
   int CountModes() const;
   DestinationMode GetMode(int index) const;
   int CountNameSets() const;
   DestinationNameSet GetNameSet(int index) const;
+  /// The mode in which the device is taken to be.
   DestinationMode GetCurrentMode() const;
   DestinationNameSet GetCurrentNameSet(short channel) const;
+  /// The patch that fits best what was sent on the channel, through this destination or another
+  /// that hangs on the same port.
   Patch GetCurrentPatch(short channel) const;
+  /// The bank of that patch.
   PatchBank GetCurrentBank(short channel) const;
+  /// The patch of just these numbers in the channel's name set.
   Patch GetPatch(short channel, PatchNumbers const& numbers) const;
+  /// The document in use; no names if there is none.
   Names GetNames() const;
+  /// Uses another document or standard mode from now on. Edits that are not saved are lost: call
+  /// Setup::SaveEditedDestBanks before it to keep them.
   void SetNames(Names const& names) const;
+  /// What takes the place of the bank's own patches; no names if nothing does.
   Names GetOverrideNames(PatchBank const& bank) const;
+  /// Puts the patches of another document in the place of the bank's own. No names take that away;
+  /// the bank is empty until the names are loaded anew.
   void SetOverrideNames(PatchBank const& bank, Names const& names) const;
+
+  /// Sends what leaves the current mode and what selects `mode`, which then is the current one with
+  /// its name sets, also if nothing can be sent. CurrentPatchChanged tells it for all channels. The
+  /// device's own ID is put into long messages, or 126, to which all answer. Does nothing for the
+  /// current mode and for a null handle.
   void SendModeChange(DestinationMode const& mode) const;
+  /// Sends the bank select and the program change of a patch that the channel's name set offers.
+  /// CurrentPatchChanged tells it at once, and Setup::Poll again when it has seen what went out.
+  /// Does nothing for a null handle.
   void SendPatchChange(short channel, Patch const& patch) const;
 };
 

@@ -76,6 +76,10 @@ std::uint8_t OnWire(unsigned panelNumber, unsigned base) {
 
 void DevTypeFileReader::Read() {
   XMLLib::Parser parser(file_);
+  Read(parser);
+}
+
+void DevTypeFileReader::Read(XMLLib::Parser& parser) {
   if (!parser.DownToReqChildNounexp(Names::kRoot)) {
     Note(parser, "the root element is not " + Quoted(Names::kRoot) + ": nothing is read");
     return;

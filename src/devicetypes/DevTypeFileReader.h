@@ -25,6 +25,8 @@ class DevTypeFileReader {
       : file_(file), notes_(notes) {}
 
   void Read();
+  /// The same of a document that lies elsewhere; `parser` stands above its root.
+  void Read(XMLLib::Parser& parser);
 
   std::vector<RCPtrMT<DeviceTypeInfoImpl>> const& Types() const { return types_; }
   /// The lines on which these types start.

@@ -25,20 +25,17 @@ bool IsInstalled(UString const& image) {
   return Folder::Find(Folder::kSystemDeviceFiles, Folder::kDoNotCreate).SearchFolder(image, found);
 }
 
-// The line where the parser gave up, which it names at the start of its text; 0 for a file that
-// could not be read at all.
-int LineOf(VantorError const& fault) {
-  constexpr std::string_view kBefore = "line ";
-  bool const namesLine = fault.Domain() == "XML" && fault.Text().starts_with(kBefore);
-  return namesLine ? std::atoi(fault.Text().c_str() + kBefore.size()) : 0;
-}
-
+// The parser's texts name the line where it gave up: "line 7: mismatched tag". A fault of another
+// kind means that the file could not be read at all.
 DeviceTypeFileNote NoteOfFault() {
   VantorError const fault = VantorError::GetCurrentError();
-  int const line = LineOf(fault);
-  return {line, (line == 0 ? "the file cannot be read: "
-                           : "nothing is read from here on, nor the type that stands open: ") +
-                    UString(fault.Text())};
+  constexpr std::string_view kBefore = "line ";
+  std::size_t const end = fault.Text().find(": ");
+  if (fault.Domain() != "XML" || !fault.Text().starts_with(kBefore) || end == std::string::npos) {
+    return {0, "the file cannot be read: " + UString(fault.Text())};
+  }
+  return {std::atoi(fault.Text().c_str() + kBefore.size()),
+          "nothing is read from here on: " + UString(fault.Text().substr(end + 2))};
 }
 
 // What only the whole file tells.

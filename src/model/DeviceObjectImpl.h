@@ -12,9 +12,6 @@ namespace Ostinet::Impl {
 /// The property keys that changed since the last round.
 using PropertyKeys = std::set<UString>;
 
-/// The first six numbers of the slot descriptor that `peer` gives; zeros where there are fewer.
-SlotID SlotIDOf(ImplImpl const& peer);
-
 /// What devices, entities and endpoints share: a peer with properties, and whether the platform
 /// (direct) or the user (not direct) made the thing.
 class DeviceObjectImpl : public ObjectImpl {

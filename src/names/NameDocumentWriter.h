@@ -10,12 +10,13 @@ namespace Ostinet::Impl {
 
 /// What a written document says of itself: who signed in, and which destination alone it is for.
 struct WrittenFor {
+  WrittenFor() = default;
   /// `destination` lends its unique ID, and the name of its device, or its own without one.
   WrittenFor(DestinationImpl const& destination, UString author);
 
   UString author;
   UString deviceName;
-  int uniqueID;
+  int uniqueID = 0;
 };
 
 /// A bank in a written document.

@@ -96,8 +96,11 @@ void WriteNotes(XMLLib::Writer& writer, UString const& name, NoteNameTable const
     }
   }
   for (unsigned char const pitch : table.GetHiddenPitches()) {
-    wroteAny = true;
-    WriteNumberAndName(writer, kNote, pitch, UString());
+    // A pitch that was put into a group since has an entry, which alone must be read again.
+    if (table.FindNote(pitch) == nullptr) {
+      wroteAny = true;
+      WriteNumberAndName(writer, kNote, pitch, UString());
+    }
   }
   if (!wroteAny) {
     // The format wants something in a list. A group of no notes reads as nothing.

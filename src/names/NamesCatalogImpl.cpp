@@ -26,8 +26,8 @@ long long Now() {
 class Visitor : public XMLFilesVisitor {
  public:
   Visitor(std::vector<NameDocumentDigest>& old, std::vector<NameDocumentDigest>& found)
-      : old_(old), found_(found) {
-    for (NameDocumentDigest& digest : old_) {
+      : found_(found) {
+    for (NameDocumentDigest& digest : old) {
       unclaimed_.emplace(Key(digest.inUserFolder, digest.file), &digest);
     }
   }
@@ -63,9 +63,8 @@ class Visitor : public XMLFilesVisitor {
     return known;
   }
 
-  std::vector<NameDocumentDigest>& old_;
   std::vector<NameDocumentDigest>& found_;
-  std::map<Key, NameDocumentDigest*> unclaimed_;  // into old_, the first of each file
+  std::map<Key, NameDocumentDigest*> unclaimed_;  // into the old ones, the first of each file
 };
 
 }  // namespace

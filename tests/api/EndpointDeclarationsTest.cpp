@@ -66,40 +66,21 @@ TEST(Declarations, OfEndpointsAreComplete) {
   Link<Const<Destination, void, TimeStamp, SysexRef const&>>(&Destination::SendSysex);
   Link<Const<Destination, void>>(&Destination::FlushOutput);
   Link<Const<Destination, double>>(&Destination::GetAdvanceScheduleTime);
-  // Names, device types and the plug-in engine: declared here, checked by the compiler alone.
-  static_assert(sizeof(Link<Const<Destination, int>>(&Destination::CountModes)) > 0, "");
-  static_assert(sizeof(Link<Const<Destination, DestinationMode, int>>(&Destination::GetMode)) > 0,
-                "");
-  static_assert(sizeof(Link<Const<Destination, int>>(&Destination::CountNameSets)) > 0, "");
-  static_assert(
-      sizeof(Link<Const<Destination, DestinationNameSet, int>>(&Destination::GetNameSet)) > 0, "");
-  static_assert(sizeof(Link<Const<Destination, DestinationMode>>(&Destination::GetCurrentMode)) > 0,
-                "");
-  static_assert(sizeof(Link<Const<Destination, DestinationNameSet, short>>(
-                    &Destination::GetCurrentNameSet)) > 0,
-                "");
-  static_assert(sizeof(Link<Const<Destination, Patch, short>>(&Destination::GetCurrentPatch)) > 0,
-                "");
-  static_assert(
-      sizeof(Link<Const<Destination, PatchBank, short>>(&Destination::GetCurrentBank)) > 0, "");
-  static_assert(sizeof(Link<Const<Destination, Patch, short, PatchNumbers const&>>(
-                    &Destination::GetPatch)) > 0,
-                "");
-  static_assert(sizeof(Link<Const<Destination, Names>>(&Destination::GetNames)) > 0, "");
-  static_assert(sizeof(Link<Const<Destination, void, Names const&>>(&Destination::SetNames)) > 0,
-                "");
-  static_assert(
-      sizeof(Link<Const<Destination, Names, PatchBank const&>>(&Destination::GetOverrideNames)) > 0,
-      "");
-  static_assert(sizeof(Link<Const<Destination, void, PatchBank const&, Names const&>>(
-                    &Destination::SetOverrideNames)) > 0,
-                "");
-  static_assert(sizeof(Link<Const<Destination, void, DestinationMode const&>>(
-                    &Destination::SendModeChange)) > 0,
-                "");
-  static_assert(sizeof(Link<Const<Destination, void, short, Patch const&>>(
-                    &Destination::SendPatchChange)) > 0,
-                "");
+  Link<Const<Destination, int>>(&Destination::CountModes);
+  Link<Const<Destination, DestinationMode, int>>(&Destination::GetMode);
+  Link<Const<Destination, int>>(&Destination::CountNameSets);
+  Link<Const<Destination, DestinationNameSet, int>>(&Destination::GetNameSet);
+  Link<Const<Destination, DestinationMode>>(&Destination::GetCurrentMode);
+  Link<Const<Destination, DestinationNameSet, short>>(&Destination::GetCurrentNameSet);
+  Link<Const<Destination, Patch, short>>(&Destination::GetCurrentPatch);
+  Link<Const<Destination, PatchBank, short>>(&Destination::GetCurrentBank);
+  Link<Const<Destination, Patch, short, PatchNumbers const&>>(&Destination::GetPatch);
+  Link<Const<Destination, Names>>(&Destination::GetNames);
+  Link<Const<Destination, void, Names const&>>(&Destination::SetNames);
+  Link<Const<Destination, Names, PatchBank const&>>(&Destination::GetOverrideNames);
+  Link<Const<Destination, void, PatchBank const&, Names const&>>(&Destination::SetOverrideNames);
+  Link<Const<Destination, void, DestinationMode const&>>(&Destination::SendModeChange);
+  Link<Const<Destination, void, short, Patch const&>>(&Destination::SendPatchChange);
 
   Link<Mutable<DestinationList, void, ObjectFilter<Endpoint> const&>>(&DestinationList::Reset);
   Link<Mutable<DestinationList, void, std::vector<ObjectFilter<Endpoint>>&>>(

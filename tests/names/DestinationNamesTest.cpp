@@ -271,6 +271,23 @@ TEST_F(DestinationNamesTest, OldHandlesAnswerFromTheOldTree) {
   EXPECT_EQ(mode.GetDestination(), Destination::kNoDestination);
 }
 
+TEST_F(DestinationNamesTest, HandlesOfADestinationThatIsGoneKnowNoDestination) {
+  Destination destination = MakeOne();
+  PatchBank const bank = BankOf(destination);
+  DestinationMode const mode = destination.GetMode(0);
+  setup.RemoveDestination(ImplOf(destination));
+  EXPECT_EQ(mode.GetDestination(), Destination::kNoDestination);
+  destination = MakeOne();
+  PatchBank const second = BankOf(destination);
+  destination = Destination();
+  setup.SignOut(false);
+  listener.names.clear();
+  EXPECT_EQ(second.GetNameSet().GetDestination(), Destination::kNoDestination);
+  EXPECT_EQ(bank.CountPatches(), 2);
+  // Nobody hears of an edit any more.
+  EditNote(second, "Bell");
+}
+
 TEST_F(DestinationNamesTest, ChannelsOutOfRangeHaveNone) {
   Destination const destination = MakeOne();
   for (short const channel : std::initializer_list<short>{-1, 16, 1000}) {
@@ -344,7 +361,7 @@ TEST_F(ChosenNamesTest, AStandardModeIsPointedAtByADocumentOfOurs) {
   EXPECT_EQ(destination.GetNames(),
             Names(Names::kStandardModeNames, FileOf("system/Standard.midnam"), "General MIDI"));
   FileSpecification const written = ConfigurationOf(destination).masterFile;
-  EXPECT_EQ(written.GetFullPath(), prefs.FolderPath() + "/MIDINameDocuments/Synth.midnam");
+  EXPECT_EQ(written, FileSpecification(prefs.FolderPath() + "/MIDINameDocuments/Synth.midnam"));
   destination.SetNames(Names(Names::kMasterNames, FileOf("user/One.midnam")));
   EXPECT_TRUE(written.IsFile());
   setup.SignOut(false);
