@@ -26,6 +26,10 @@ option(OSTINET_WARNINGS_AS_ERRORS "Treat warnings as errors" ${PROJECT_IS_TOP_LE
 option(OSTINET_PRECOMPILE "Precompile headers for the library too, which saves time" OFF)
 set(OSTINET_SANITIZE "" CACHE STRING "Value for -fsanitize=, empty for none")
 
+# Documents of real instruments, which are no part of the tree.
+set(OSTINET_NAME_CORPUS "${PROJECT_SOURCE_DIR}/../shared/corpus/midnam" CACHE PATH
+  "Folder of name documents that tests and benchmarks read, where it is there")
+
 find_program(CCACHE_PROGRAM ccache)
 if(CCACHE_PROGRAM AND NOT CMAKE_CXX_COMPILER_LAUNCHER)
   # Paths are told relative to the tree, so that clones share what they compiled, and precompiled
@@ -44,6 +48,9 @@ target_compile_options(ostinet_settings INTERFACE
   $<$<AND:$<CXX_COMPILER_ID:GNU>,$<VERSION_LESS:$<CXX_COMPILER_VERSION>,13>>:-Wno-restrict>
   # Optimising, GCC 12 takes the small buffers of boost::function and std::optional for unset.
   $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>
+  # Nor does it know that the distance between two ends of a vector is never negative.
+  $<$<AND:$<CXX_COMPILER_ID:GNU>,$<NOT:$<CONFIG:Debug>>>:-Wno-stringop-overread>
+  $<$<AND:$<CXX_COMPILER_ID:GNU>,$<NOT:$<CONFIG:Debug>>>:-Wno-stringop-overflow>
   # Without a time in them, precompiled headers made anew are the same to the compiler cache.
   "$<$<CXX_COMPILER_ID:Clang>:SHELL:-Xclang -fno-pch-timestamp>"
   $<$<BOOL:${OSTINET_WARNINGS_AS_ERRORS}>:-Werror>)

@@ -143,7 +143,7 @@ std::string NameDocumentJSON(NameDocument const& document) {
              [&](int index) { return document.GetSupportedStandardMode(index).string(); })},
       {"nameSets", Array(document.CountNameSets(),
                          [&](int index) { return NameSetJSON(document.GetNameSet(index)); })}};
-  return json.dump(2);
+  return json.dump(2, ' ', false, Json::error_handler_t::replace);
 }
 
 std::string NameChecksJSON(std::vector<CheckedNameDocument> const& files) {
@@ -157,7 +157,7 @@ std::string NameChecksJSON(std::vector<CheckedNameDocument> const& files) {
             {"valid", file.check.isStandard},
             {"findings", findings}};
   });
-  return json.dump(2);
+  return json.dump(2, ' ', false, Json::error_handler_t::replace);
 }
 
 }  // namespace Ostinet::Tool

@@ -1,16 +1,21 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <boost/container/flat_set.hpp>
+#include <boost/container/small_vector.hpp>
+#include <cstddef>
+#include <functional>
 #include <memory>
-#include <set>
 
 #include "model/ImplImpl.h"
 #include "model/ObjectImpl.h"
 
 namespace Ostinet::Impl {
 
-/// The property keys that changed since the last round.
-using PropertyKeys = std::set<UString>;
+/// The property keys that changed since the last round: few, so that most of them need no memory of
+/// their own.
+using PropertyKeys = boost::container::flat_set<UString, std::less<UString>,
+                                                boost::container::small_vector<UString, 1>>;
 
 /// What devices, entities and endpoints share: a peer with properties, and whether the platform
 /// (direct) or the user (not direct) made the thing.
@@ -27,6 +32,9 @@ class DeviceObjectImpl : public ObjectImpl {
   /// True if connections must be worked out anew.
   virtual bool HandlePropertyChanges(PropertyKeys const& keys);
   virtual void WriteXML(XMLLib::Writer& writer) const = 0;
+
+  /// Where the platform's notes of changes have this object; theirs alone to read and write.
+  std::size_t placeInChanges = 0;
 
   ImplImpl* Peer() const { return peer_.get(); }
   bool IsDirect() const { return isDirect_; }

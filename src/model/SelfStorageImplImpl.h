@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
-#include <map>
+#include <boost/container/flat_map.hpp>
 
 #include "model/ImplImpl.h"
 
@@ -11,7 +11,8 @@ namespace Ostinet::Impl {
 /// A key that is held with another type than asked for ends the climb without a value.
 class SelfStorageImplImpl : public ImplImpl {
  public:
-  using Store = std::map<UString, PropertyValue>;
+  /// In one block: a studio may have ten thousand peers, each with a handful of properties.
+  using Store = boost::container::flat_map<UString, PropertyValue>;
 
   SelfStorageImplImpl() = default;
   ~SelfStorageImplImpl() override;

@@ -11,10 +11,19 @@ namespace {
 
 using namespace DocumentNames;
 
-template <class Number>
-void WriteNumber(XMLLib::Writer& writer, XMLLib::Name const& attribute, Number number) {
+void WriteNumber(XMLLib::Writer& writer, XMLLib::Name const& attribute, unsigned number) {
   UString text;
   text.Stream() << number;
+  writer.Attribute(attribute, text);
+}
+
+// The format allows no "+" here, so 1e+06 loses the one in its exponent.
+void WriteNumber(XMLLib::Writer& writer, XMLLib::Name const& attribute, double number) {
+  UString text;
+  text.Stream() << number;
+  if (auto const plus = text.find(u'+'); plus != UString::npos) {
+    text.erase(plus, 1);
+  }
   writer.Attribute(attribute, text);
 }
 

@@ -63,23 +63,45 @@ bool TakeOffline(EndpointImpl& endpoint) {
   return wasOffline == 0;
 }
 
+/// The endpoints that were found with their ports, each at its place in the studio's list. All get
+/// their "offline" written, as hosts rely on, but in the order of the list and not of the names:
+/// that is how they lie in memory.
+class Present {
+ public:
+  explicit Present(std::size_t count) : endpoints_(count) {}
+  void Add(Named<EndpointImpl*> const& endpoint) { endpoints_[endpoint.order] = endpoint.thing; }
+  void SetOnline() {
+    for (EndpointImpl* const endpoint : endpoints_) {
+      if (endpoint != nullptr) {
+        endpoint->Peer()->SetInt(Keys::kOffline, 0);
+      }
+    }
+  }
+
+ private:
+  std::vector<EndpointImpl*> endpoints_;
+};
+
 /// Port and endpoint bear one name. A name that stays while the port changes its kind leaves
 /// both untouched: hosts keep such an endpoint as it was until the port comes back.
-bool Join(PortAttacher& attacher, PortInfo const& port, EndpointImpl& endpoint) {
-  if (!PortAttacher::IsPair(endpoint, port)) {
+bool Join(PortAttacher& attacher, PortInfo const& port, Named<EndpointImpl*> const& endpoint,
+          Present& present) {
+  if (!PortAttacher::IsPair(*endpoint.thing, port)) {
     return false;
   }
-  WinMIDIPort* const peer = WinMIDIPort::Of(endpoint);
+  WinMIDIPort* const peer = WinMIDIPort::Of(*endpoint.thing);
   bool const isDetached = peer != nullptr && peer->GetActiveImpl() == nullptr;
   if (isDetached) {
     attacher.Attach(port);
   }
-  endpoint.Peer()->SetInt(Keys::kOffline, 0);
+  present.Add(endpoint);
   return isDetached;
 }
 
-bool Merge(PortAttacher& attacher, PortsByName const& ports, EndpointsByName const& endpoints) {
+bool Merge(PortAttacher& attacher, PortsByName const& ports, EndpointsByName const& endpoints,
+           std::size_t count) {
   bool changed = false;
+  Present present(count);
   auto port = ports.begin();
   auto endpoint = endpoints.begin();
   while (port != ports.end() || endpoint != endpoints.end()) {
@@ -93,11 +115,12 @@ bool Merge(PortAttacher& attacher, PortsByName const& ports, EndpointsByName con
       changed |= TakeOffline(*endpoint->thing);
       ++endpoint;
     } else {
-      changed |= Join(attacher, *port->thing, *endpoint->thing);
+      changed |= Join(attacher, *port->thing, *endpoint, present);
       ++port;
       ++endpoint;
     }
   }
+  present.SetOnline();
   return changed;
 }
 
@@ -113,10 +136,13 @@ bool Reconcile(WinMIDISetup& setup, PortAttacher& attacher, PortList const& port
   }
   SortByName(newSources);
   SortByName(newDestinations);
-  EndpointsByName const sources = ByName(setup.Lists().sources);
-  EndpointsByName const destinations = ByName(setup.Lists().destinations);
-  bool const sourcesChanged = Merge(attacher, newSources, sources);
-  bool const destinationsChanged = Merge(attacher, newDestinations, destinations);
+  auto const& studio = setup.Lists();
+  EndpointsByName const sources = ByName(studio.sources);
+  EndpointsByName const destinations = ByName(studio.destinations);
+  std::size_t const sourceCount = studio.sources.size();
+  std::size_t const destinationCount = studio.destinations.size();
+  bool const sourcesChanged = Merge(attacher, newSources, sources, sourceCount);
+  bool const destinationsChanged = Merge(attacher, newDestinations, destinations, destinationCount);
   return sourcesChanged || destinationsChanged;
 }
 

@@ -101,12 +101,13 @@ void WinMIDISetup::PlatformSignOut() {
     }
   }
   activeSources_.clear();
+  inActiveSources_.clear();
   {
     MutexHolder const lock(virtualSourcesMutex_);
     virtualSources_.clear();
   }
   StopSession();
-  pendingChanges_.clear();
+  pendingChanges_.Clear();
 }
 
 void WinMIDISetup::PlatformLoadSetup() {
@@ -139,7 +140,7 @@ void WinMIDISetup::MarkOfflinePorts() {
 }
 
 void WinMIDISetup::PropChanged(DeviceObjectImpl* object, UString const& key) {
-  pendingChanges_[object].insert(key);
+  pendingChanges_.Add(object, key);
 }
 
 void WinMIDISetup::DevicesChanged() {
@@ -189,10 +190,8 @@ bool WinMIDISetup::PlatformPollSetupChanges(bool& connectionsChanged) {
 
 bool WinMIDISetup::HandlePendingChanges(bool& connectionsChanged) {
   // What the objects do may change properties anew: those wait for the next round.
-  PendingChanges changes;
-  changes.swap(pendingChanges_);
   bool notify = false;
-  for (auto const& [object, keys] : changes) {
+  for (auto const& [object, keys] : pendingChanges_.Take()) {
     if (object->Exists()) {
       notify = true;
       connectionsChanged |= object->HandlePropertyChanges(keys);
@@ -202,16 +201,17 @@ bool WinMIDISetup::HandlePendingChanges(bool& connectionsChanged) {
 }
 
 void WinMIDISetup::AddActiveSource(RCPtrMT<EndpointImpl> const& source) {
-  if (std::find(activeSources_.begin(), activeSources_.end(), source) == activeSources_.end()) {
+  if (inActiveSources_.insert(source.get()).second) {
     activeSources_.push_back(source);
   }
 }
 
 void WinMIDISetup::DropRemovedSources() {
-  activeSources_.erase(
-      std::remove_if(activeSources_.begin(), activeSources_.end(),
-                     [](RCPtrMT<EndpointImpl> const& source) { return !source->Exists(); }),
-      activeSources_.end());
+  auto const isRemoved = [this](RCPtrMT<EndpointImpl> const& source) {
+    return !source->Exists() && inActiveSources_.erase(source.get()) != 0;
+  };
+  activeSources_.erase(std::remove_if(activeSources_.begin(), activeSources_.end(), isRemoved),
+                       activeSources_.end());
 }
 
 void WinMIDISetup::PlatformPollImpl() {

@@ -1,15 +1,16 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
-#include <map>
 #include <memory>
 #include <optional>
+#include <unordered_set>
 
 #include "core/JobThread.h"
 #include "core/Mutex.h"
 #include "model/DeviceObjectImpl.h"
 #include "model/Studio.h"
 #include "ostinet/Setup.h"
+#include "platform/PendingChanges.h"
 #include "platform/PortList.h"
 #include "platform/Session.h"
 
@@ -69,7 +70,6 @@ class WinMIDISetup : public Setup, public WinMIDIDevicesListener {
 
  private:
   using Sources = std::vector<RCPtrMT<EndpointImpl>>;
-  using PendingChanges = std::map<RCPtrMT<DeviceObjectImpl>, PropertyKeys>;
 
   std::shared_ptr<Session> GetSession() const;
   void StartSession();
@@ -93,7 +93,8 @@ class WinMIDISetup : public Setup, public WinMIDIDevicesListener {
   VantorCoreMutex virtualSourcesMutex_;
   Sources virtualSources_ OSTINET_GUARDED_BY(virtualSourcesMutex_);
 
-  Sources activeSources_;
+  Sources activeSources_;                                    // in the order in which they came
+  std::unordered_set<EndpointImpl const*> inActiveSources_;  // the same
   Sources roomForCopy_;
   PendingChanges pendingChanges_;
   bool setupChanged_ = false;

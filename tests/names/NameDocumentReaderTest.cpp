@@ -422,6 +422,28 @@ TEST(MasterReader, ReadsOtherEncodings) {
   EXPECT_EQ(PatchNames(BankOf(ReadMaster(text))), "Fl\xC3\xBCgel;");
 }
 
+TEST(NameSetReader, TakesItsListsInAnyOrderAndWithoutBanks) {
+  auto const reader = ReadMaster(
+      MasterText("<ChannelNameSet Name='S'><UsesControlNameList Name='C'/><!-- <PatchBank/> -->"
+                 "<UsesNoteNameList Name=''/></ChannelNameSet>"
+                 "<ControlNameList Name='C'><Control Number='0' Name='c'/></ControlNameList>"));
+  auto const& nameSet = reader->tree.nameSets.at(0);
+  EXPECT_TRUE(nameSet->GetBanks().empty());
+  EXPECT_EQ(reader->uses.nameSetControls.at(nameSet)->controls.size(), 1U);
+  EXPECT_TRUE(reader->uses.nameSetNotes.at(nameSet)->notes.empty());
+}
+
+TEST(MasterReader, KeepsANameSetThatNobodyDefines) {
+  auto const reader =
+      ReadMaster(MasterText("<CustomDeviceMode Name='M'><ChannelNameSetAssignments>"
+                            "<ChannelNameSetAssign Channel='1' NameSet='(null)'/>"
+                            "</ChannelNameSetAssignments></CustomDeviceMode>"
+                            "<ChannelNameSet Name='S'><PatchBank/></ChannelNameSet>"));
+  ASSERT_EQ(reader->tree.nameSets.size(), 2U);
+  EXPECT_EQ(reader->tree.nameSets[0]->GetName(), UString("(null)"));
+  EXPECT_TRUE(reader->tree.nameSets[0]->GetBanks().empty());
+}
+
 TEST(PatchReader, TakesEntitiesAndBlanksInNamesAsTheyStand) {
   auto const reader =
       ReadMaster(PatchesText("<Patch Number='001' Name=' Rock &amp; &lt;Roll&gt; '/>"

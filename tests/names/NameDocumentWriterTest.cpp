@@ -292,7 +292,7 @@ TEST(CommandWriter, WritesPendingNumbersInTheOrderOfTheWire) {
 }
 
 TEST(CommandWriter, WritesWhatTheReaderReads) {
-  for (std::string const& commands :
+  for (std::string const commands :
        {"<NoteOff Note=\"1\" Velocity=\"2\"/><NoteOn Note=\"1\" Velocity=\"2\"/>"
         "<PolyKeyPressure Note=\"5\" Pressure=\"6\"/><ControlChange Control=\"7\" Value=\"8\"/>"
         "<ProgramChange Number=\"9\"/><ChannelKeyPressure Pressure=\"10\"/>"

@@ -18,7 +18,8 @@ RCPtrMT<Impl::NoteNameData> NotesOf(std::string const& content) {
 /// "60=C4/1;": pitch, name and group.
 std::string NotesText(std::string const& content) {
   std::string text;
-  for (auto const& note : NotesOf(content)->notes) {
+  auto const list = NotesOf(content);
+  for (auto const& note : list->notes) {
     text += std::to_string(note.pitch) + "=" + note.name.string() +
             (note.group != 0 ? "/" + std::to_string(note.group) : "") + ";";
   }

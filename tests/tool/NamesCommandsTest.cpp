@@ -22,16 +22,15 @@ class NamesCommands : public ToolTest {
   <ChannelNameSet Name="Main">
    <PatchBank Name="A"><MIDICommands><ControlChange Control="0" Value="1"/></MIDICommands>
     <PatchNameList><Patch Number="1" Name="Piano" ProgramChange="5">
-     <NoteNameList><NoteGroup Name="Low"><Note Number="36" Name="Kick"/></NoteGroup></NoteNameList>
+     <NoteNameList><NoteGroup Name="Low"><Note Number="36" Name="Kick"/>
+      <Note Number="38" Name="Snare"/></NoteGroup></NoteNameList>
      <ControlNameList><Control Type="7bit" Number="74" Name="Cutoff"><Values Min="0" Max="127"
       Units="Hz"/></Control></ControlNameList>
     </Patch></PatchNameList></PatchBank>
    <PatchBank Name="B"><PatchNameList><Patch Number="1" Name="Organ" ProgramChange="6"/>
     </PatchNameList></PatchBank></ChannelNameSet></MasterDeviceNames></MIDINameDocument>)");
   }
-  ToolRun Do(std::vector<std::string> const& arguments) {
-    return RunOn(kCabledStudio, arguments);
-  }
+  ToolRun Do(std::vector<std::string> const& arguments) { return RunOn(kCabledStudio, arguments); }
   json DoJSON(std::vector<std::string> arguments) {
     arguments.push_back("--json");
     ToolRun const run = Do(arguments);
@@ -84,8 +83,9 @@ TEST_F(NamesCommands, ListNotesAndControlsOfAPatch) {
   ChooseDocument();
   json const notes = DoJSON({"notes", "Out 1", "Piano"});
   EXPECT_EQ(notes["notes"][0]["pitch"], 36);
-  EXPECT_EQ(notes["groups"][0]["name"], "Low");
-  EXPECT_THAT(Do({"notes", "Out 1"}).Lines(), ElementsAre("36 C2  Kick  (Low)"));
+  EXPECT_EQ(notes["groups"].at(0)["name"], "Low");
+  EXPECT_THAT(Do({"notes", "Out 1"}).Lines(),
+              ElementsAre("36 C2  Kick  (Low)", "38 D2  Snare  (Low)"));
   json const controls = DoJSON({"controls", "Out 1", "Piano"})["controls"];
   EXPECT_EQ(controls[0]["type"], "7bit");
   EXPECT_EQ(controls[0]["max"], 127.0);

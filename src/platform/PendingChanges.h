@@ -1,0 +1,31 @@
+// SPDX-License-Identifier: MIT
+#pragma once
+
+#include <vector>
+
+#include "model/DeviceObjectImpl.h"
+
+namespace Ostinet::Impl {
+
+/// Which properties of which objects changed since the last poll, in the order in which the objects
+/// changed first. A studio may change ten thousand objects at once, so the notes stand side by side
+/// and each object knows its own.
+///
+/// Threads      The host's polling thread.
+class PendingChanges {
+ public:
+  struct Change {
+    RCPtrMT<DeviceObjectImpl> object;
+    PropertyKeys keys;
+  };
+
+  void Add(DeviceObjectImpl* object, UString const& key);
+  /// Gives all notes away.
+  std::vector<Change> Take();
+  void Clear() { changes_.clear(); }
+
+ private:
+  std::vector<Change> changes_;
+};
+
+}  // namespace Ostinet::Impl
