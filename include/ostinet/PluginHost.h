@@ -71,13 +71,13 @@ namespace Ostinet {
 
 /// Sends one packet as one record of the kind "short message". What is longer than a record holds
 /// is cut after 256 bytes. An empty packet or a null destination sends nothing. [any thread]
-void OSTINET_EXPORT SendMIDIPacketToSYNAPDestination(DataPacket const& packet,
+OSTINET_EXPORT void SendMIDIPacketToSYNAPDestination(DataPacket const& packet,
                                                      ISynapMIDIDestination* destination);
 
 /// Sends a long message of `length` bytes as records of up to 256 bytes each, in one call. A length
 /// below 1 or a null destination sends nothing, and so does a message for which there is no memory.
 /// [any thread]
-void OSTINET_EXPORT SendSysexToSYNAPDestination(TimeStamp stamp, unsigned char* bytes, int length,
+OSTINET_EXPORT void SendSysexToSYNAPDestination(TimeStamp stamp, unsigned char* bytes, int length,
                                                 ISynapMIDIDestination* destination);
 
 /// What a host's engine may ask and tell of its destination by the peer that SetActivatedObject

@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "model/PropertyKeys.h"
+#include "model/SlotDescriptor.h"
 #include "model/XMLNames.h"
 
 namespace Ostinet::Impl {

@@ -17,9 +17,6 @@ namespace Ostinet::Impl {
 using PropertyKeys = boost::container::flat_set<UString, std::less<UString>,
                                                 boost::container::small_vector<UString, 1>>;
 
-/// The first six numbers of the slot descriptor that `peer` gives; zeros where there are fewer.
-SlotID SlotIDOf(ImplImpl const& peer);
-
 /// What devices, entities and endpoints share: a peer with properties, and whether the platform
 /// (direct) or the user (not direct) made the thing.
 class DeviceObjectImpl : public ObjectImpl {

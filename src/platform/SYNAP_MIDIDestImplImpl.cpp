@@ -7,6 +7,7 @@
 #include "datapath/SysexImpl.h"
 #include "model/DeviceObjectImpl.h"
 #include "model/PropertyKeys.h"
+#include "model/SlotDescriptor.h"
 #include "ostinet/Setup.h"
 #include "platform/PluginRecords.h"
 

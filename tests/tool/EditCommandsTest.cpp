@@ -254,7 +254,7 @@ TEST_F(EditCommands, AnInstrumentHangsOnAPortBothWays) {
   EXPECT_EQ(entity["destinations"][0]["port"], "Desk 1");
   EXPECT_EQ(entity["destinations"][0]["online"], true);
   EXPECT_THAT(PortNamed("destinations", "Desk 1")["connected"], ElementsAre("Synth"));
-  EXPECT_EQ(Do({"list", "-l"}).Lines().size(), 10u);
+  EXPECT_EQ(Do({"list", "-l"}).Lines().size(), 13u);
   Do({"connect", "Synth", "Desk 1"});  // again
   Do({"disconnect", "Synth"});
   EXPECT_TRUE(FirstDevice()["entities"][0]["destinations"][0]["port"].is_null());
