@@ -321,11 +321,15 @@ bool DetectionRun::IsDone() const { return impl_->IsDone(); }
 std::vector<DetectionRun::Port> const& DetectionRun::Ports() const { return impl_->Ports(); }
 DetectionRun::Progress DetectionRun::GetProgress() const { return impl_->GetProgress(); }
 
-// The answers are sysex; what else arrives stays outside of the queue.
-bool DetectionRun::WantsPacket(DataPacket const& packet, Source const&) {
-  return packet.length != 0 &&
-         (packet.data[0] == 0xF0 || packet.data[0] == 0xF7 || packet.data[0] < 0x80);
+bool DetectionRun::IsSysex(DataPacket const& packet) {
+  constexpr unsigned char kSysex = 0xF0;
+  constexpr unsigned char kEndOfExclusive = 0xF7;
+  constexpr unsigned char kFirstStatus = 0x80;
+  return packet.length != 0 && (packet.data[0] < kFirstStatus || packet.data[0] == kSysex ||
+                                packet.data[0] == kEndOfExclusive);
 }
+
+bool DetectionRun::WantsPacket(DataPacket const& packet, Source const&) { return IsSysex(packet); }
 
 void DetectionRun::HandlePacket(DataPacket const& packet, Source const& source) {
   impl_->Take(packet, source);

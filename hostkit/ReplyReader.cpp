@@ -23,17 +23,12 @@ unsigned char const* EndOfRun(unsigned char const* begin, unsigned char const* e
   return stop != end && *stop == kEndOfExclusive ? stop + 1 : stop;
 }
 
-// Ports hand short messages over as three bytes, of which the last may mean nothing.
-bool IsShortMessage(DataPacket const& packet) {
-  return packet.length == 0 || (packet.data[0] >= kFirstStatus && packet.data[0] != kSysex &&
-                                packet.data[0] != kEndOfExclusive);
-}
-
 }  // namespace
 
 std::vector<Reply> ReplyReader::Take(DataPacket const& packet) {
   std::vector<Reply> replies;
-  if (IsShortMessage(packet)) {
+  // Ports hand short messages over as three bytes, of which the last may mean nothing.
+  if (!DetectionRun::IsSysex(packet)) {
     return replies;
   }
   unsigned char const* byte = packet.data;

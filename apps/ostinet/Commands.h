@@ -27,6 +27,14 @@ void AddPanicCommand(CLI::App& app, CommandLine& line);
 void AddRefCommand(CLI::App& app, CommandLine& line);
 void AddResolveCommand(CLI::App& app, CommandLine& line);
 void AddPairCommand(CLI::App& app, CommandLine& line);
+void AddDeviceCommand(CLI::App& app, CommandLine& line);
+void AddEntityCommand(CLI::App& app, CommandLine& line);
+void AddConnectCommand(CLI::App& app, CommandLine& line);
+void AddDisconnectCommand(CLI::App& app, CommandLine& line);
+void AddVirtualCommand(CLI::App& app, CommandLine& line);
+void AddDrawCommand(CLI::App& app, CommandLine& line);
+void AddTypesCommand(CLI::App& app, CommandLine& line);
+void AddDetectCommand(CLI::App& app, CommandLine& line);
 void AddNamesCommand(CLI::App& app, CommandLine& line);
 void AddModesCommand(CLI::App& app, CommandLine& line);
 void AddBanksCommand(CLI::App& app, CommandLine& line);
@@ -36,8 +44,6 @@ void AddControlsCommand(CLI::App& app, CommandLine& line);
 void AddSelectCommand(CLI::App& app, CommandLine& line);
 void AddModeCommand(CLI::App& app, CommandLine& line);
 void AddNoteNameCommand(CLI::App& app, CommandLine& line);
-void AddTypesCommand(CLI::App& app, CommandLine& line);
-void AddNamesCommand(CLI::App& app, CommandLine& line);
 
 /// Adds --for and --count.
 void AddLimits(CLI::App& command, Limits& limits);

@@ -55,7 +55,7 @@ void ShowNames(GlobalOptions const& globals, NamesOptions const& options) {
   }
   PrintOne(globals.json, NamesJSON(destination), NamesLines(destination));
   if (isEdit) {
-    session.GetSetup().SignOut(true);
+    session.Save();
   }
 }
 

@@ -2,12 +2,13 @@
 #include <CLI/CLI.hpp>
 #include <algorithm>
 #include <cstdio>
+#include <utility>
 
 #include "Commands.h"
 #include "DetectText.h"
 #include "DetectedDevices.h"
 #include "Errors.h"
-#include "NameMatch.h"
+#include "Lookup.h"
 #include "Output.h"
 #include "ostinet/core/Terminal.h"
 
@@ -19,6 +20,15 @@ struct DetectOptions {
   std::vector<std::string> excluded;
   double timeout = 0.0;
   bool create = false;
+};
+
+// Lets through what the run, which hears the sources directly, is to get.
+class SysexFilter : public Receiver {
+ public:
+  bool WantsPacket(DataPacket const& packet, Source const&) override {
+    return DetectionRun::IsSysex(packet);
+  }
+  void HandlePacket(DataPacket const&, Source const&) override {}
 };
 
 // The line of a terminal that is written over and over.
@@ -33,12 +43,16 @@ class ProgressDisplay {
     auto const progress = run.GetProgress();
     if (isShown_ && progress.port < run.Ports().size()) {
       std::string const port = run.Ports()[progress.port].destination.GetName().string();
-      Write(ProgressLine(progress, port, kWidth));
+      std::string const line = ProgressLine(progress, port, kWidth);
+      if (line != last_) {
+        Write(line);
+        last_ = line;
+      }
     }
   }
 
   void Clear() {
-    if (isShown_) {
+    if (!std::exchange(last_, "").empty()) {
       Write("");
     }
   }
@@ -53,16 +67,8 @@ class ProgressDisplay {
   }
 
   bool const isShown_;
+  std::string last_;  // what stands on the line
 };
-
-template <class Port>
-std::vector<Candidate> CandidatesOf(std::vector<Port> const& ports) {
-  std::vector<Candidate> candidates;
-  for (Port const& port : ports) {
-    candidates.push_back({port.GetName().string(), port.GetUniqueID()});
-  }
-  return candidates;
-}
 
 // A name stands for the output and for the input that it fits; it has to fit one of them.
 std::vector<Endpoint> Excluded(std::vector<std::string> const& names) {
@@ -70,17 +76,13 @@ std::vector<Endpoint> Excluded(std::vector<std::string> const& names) {
   std::vector<Source> const sources = DetectionRun::SourcesToHear();
   std::vector<Endpoint> excluded;
   for (std::string const& name : names) {
-    auto const destination = FindName(CandidatesOf(destinations), name, "port");
-    auto const source = FindName(CandidatesOf(sources), name, "port");
-    if (!destination && !source) {
-      MatchName(CandidatesOf(destinations), name, "port");  // Tells what there is.
+    Destination const destination = TryFind(destinations, name, "port");
+    Source const source = TryFind(sources, name, "port");
+    if (!destination.Exists() && !source.Exists()) {
+      Find(destinations, name, "port");  // Throws, and tells which there are.
     }
-    if (destination) {
-      excluded.push_back(destinations[*destination]);
-    }
-    if (source) {
-      excluded.push_back(sources[*source]);
-    }
+    excluded.push_back(destination);
+    excluded.push_back(source);
   }
   return excluded;
 }
@@ -89,7 +91,7 @@ std::vector<Destination> Chosen(std::vector<Destination> const& all,
                                 std::vector<std::string> const& names) {
   std::vector<Destination> chosen;
   for (std::string const& name : names) {
-    Destination const port = all[MatchName(CandidatesOf(all), name, "port")];
+    Destination const port = Find(all, name, "port");
     if (std::find(chosen.begin(), chosen.end(), port) == chosen.end()) {
       chosen.push_back(port);
     }
@@ -120,7 +122,7 @@ std::vector<DetectedPort> View(DetectionRun const& run) {
 // Notes in the views what was made. True if anything was.
 bool CreateDevices(Setup& setup, DetectionRun const& run, std::vector<DetectedPort>& views) {
   bool isAnyMade = false;
-  for (std::size_t i = 0; i < run.Ports().size(); ++i) {
+  for (std::size_t i = 0; i < views.size(); ++i) {
     DetectionRun::Port const& port = run.Ports()[i];
     for (std::size_t j = 0; j < port.findings.size(); ++j) {
       if (auto const device = CreateDetectedDevice(setup, port.destination, port.findings[j])) {
@@ -132,8 +134,39 @@ bool CreateDevices(Setup& setup, DetectionRun const& run, std::vector<DetectedPo
   return isAnyMade;
 }
 
+void ForgetDevices(std::vector<DetectedPort>& views) {
+  for (DetectedPort& port : views) {
+    for (FindingView& finding : port.findings) {
+      finding.device.reset();
+    }
+  }
+}
+
+// What was found took its time, so it is printed also where the devices cannot be kept.
+void KeepDevices(GlobalOptions const& globals, Session& session, std::vector<DetectedPort>& views) {
+  try {
+    session.Save();
+  } catch (...) {
+    ForgetDevices(views);
+    Print(globals.json, views);
+    throw;
+  }
+}
+
+// Runs to the end, or until Ctrl-C.
+void RunShown(Session& session, DetectionRun& run, ProgressDisplay& display) {
+  display.Show(run);
+  session.Run([&] {
+    bool const goesOn = run.Step();
+    display.Show(run);
+    return goesOn;
+  });
+  display.Clear();
+}
+
 void Detect(GlobalOptions const& globals, DetectOptions const& options) {
-  Session session(globals, nullptr, nullptr);
+  SysexFilter filter;
+  Session session(globals, &filter, nullptr);
   std::vector<Endpoint> const excluded = Excluded(options.excluded);
   auto const destinations = Chosen(DetectionRun::DestinationsToAsk(excluded), options.ports);
   if (destinations.empty()) {
@@ -141,23 +174,15 @@ void Detect(GlobalOptions const& globals, DetectOptions const& options) {
   }
   DetectionRun::Options runOptions;
   runOptions.portTimeLimit = options.timeout;
-  ProgressDisplay display;
-  DetectionRun* running = nullptr;
-  runOptions.onProgress = [&] {
-    if (running != nullptr) {
-      display.Show(*running);
-    }
-  };
   DetectionRun run(destinations, DetectionRun::SourcesToHear(excluded), std::move(runOptions));
-  running = &run;
-  session.Run([&] { return run.Step(); });
+  ProgressDisplay display;
+  RunShown(session, run, display);
   bool const isWhole = run.IsDone();
   run.Cancel();
-  display.Clear();
 
   std::vector<DetectedPort> views = View(run);
   if (isWhole && options.create && CreateDevices(session.GetSetup(), run, views)) {
-    session.Save();
+    KeepDevices(globals, session, views);
   }
   Print(globals.json, views);
   if (!isWhole) {
@@ -182,7 +207,7 @@ void AddDetectCommand(CLI::App& app, CommandLine& line) {
       ->add_option("--timeout", options->timeout,
                    "At most so many seconds for each port; without it, as many as it takes")
       ->type_name("SECONDS")
-      ->check(CLI::PositiveNumber);
+      ->check(CLI::Range(0.1, 3600.0));
   command->add_flag("--create", options->create,
                     "Make a device of the right type for each instrument, on its port");
   command->footer(

@@ -5,9 +5,9 @@
 
 #include "Commands.h"
 #include "Errors.h"
+#include "Lookup.h"
 #include "MessageJoiner.h"
 #include "MonitorLine.h"
-#include "NameMatch.h"
 #include "Outgoing.h"
 #include "Output.h"
 
@@ -52,14 +52,12 @@ class Input : public Receiver {
 };
 
 void ChooseSources(Setup const& setup, std::vector<std::string> const& names, Input& input) {
-  std::vector<Candidate> candidates;
-  for (int i = 0; i < setup.CountSources(); ++i) {
-    Source const source = setup.GetSource(i);
-    candidates.push_back({source.GetName().string(), source.GetUniqueID()});
+  std::vector<Source> sources = SourcesOf(setup);
+  for (int i = 0; i < setup.CountPrivateSources(); ++i) {
+    sources.push_back(setup.GetPrivateSource(i));  // The near end of a virtual destination.
   }
   for (std::string const& name : names) {
-    size_t const place = MatchName(candidates, name, "source");
-    input.Choose(setup.GetSource(static_cast<int>(place)));
+    input.Choose(Find(sources, name, "source"));
   }
 }
 

@@ -81,8 +81,8 @@ std::vector<size_t> FindByID(std::vector<Candidate> const& candidates, std::stri
 
 }  // namespace
 
-size_t MatchName(std::vector<Candidate> const& candidates, std::string const& wanted,
-                 std::string const& kind) {
+std::optional<size_t> FindName(std::vector<Candidate> const& candidates, std::string const& wanted,
+                               std::string const& kind) {
   if (wanted.empty()) {
     throw UsageError("the name of a " + kind + " is empty");
   }
@@ -90,12 +90,17 @@ size_t MatchName(std::vector<Candidate> const& candidates, std::string const& wa
   if (found.empty()) {
     found = FindByID(candidates, wanted);
   }
-  if (found.size() == 1) {
-    return found.front();
-  }
-  if (!found.empty()) {
+  if (found.size() > 1) {
     throw Failure("more than one " + kind + " fits \"" + wanted +
                   "\": " + Listed(candidates, found));
+  }
+  return found.empty() ? std::nullopt : std::optional<size_t>(found.front());
+}
+
+size_t MatchName(std::vector<Candidate> const& candidates, std::string const& wanted,
+                 std::string const& kind) {
+  if (auto const found = FindName(candidates, wanted, kind)) {
+    return *found;
   }
   if (candidates.empty()) {
     throw Failure("there is no " + kind + " \"" + wanted + "\", nor any other");

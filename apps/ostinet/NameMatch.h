@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -20,5 +21,9 @@ struct Candidate {
 /// text what they are ("destination").
 size_t MatchName(std::vector<Candidate> const& candidates, std::string const& wanted,
                  std::string const& kind);
+
+/// The same, but nothing where none fits; more than one is still a Failure.
+std::optional<size_t> FindName(std::vector<Candidate> const& candidates, std::string const& wanted,
+                               std::string const& kind);
 
 }  // namespace Ostinet::Tool

@@ -4,7 +4,7 @@
 #include <algorithm>
 
 #include "Errors.h"
-#include "NameMatch.h"
+#include "Lookup.h"
 #include "ostinet/Setup.h"
 
 namespace Ostinet::Tool {
@@ -34,15 +34,13 @@ PollLoop::Duration WireTime(Destination const& destination, size_t bytes) {
 }  // namespace
 
 Destination FindDestination(Setup const& setup, std::string const& name) {
-  std::vector<Candidate> candidates;
-  for (int i = 0; i < setup.CountDestinations(); ++i) {
-    Destination const destination = setup.GetDestination(i);
-    candidates.push_back({destination.GetName().string(), destination.GetUniqueID()});
+  std::vector<Destination> destinations = DestinationsOf(setup);
+  for (int i = 0; i < setup.CountPrivateDestinations(); ++i) {
+    destinations.push_back(setup.GetPrivateDestination(i));  // The near end of a virtual source.
   }
-  size_t const place = MatchName(candidates, name, "destination");
-  Destination const found = setup.GetDestination(static_cast<int>(place));
+  Destination const found = Find(destinations, name, "destination");
   if (!found.IsOnline()) {
-    throw Failure("the destination \"" + candidates[place].name + "\" is offline");
+    throw Failure("the destination \"" + found.GetName().string() + "\" is offline");
   }
   return found;
 }

@@ -3,7 +3,7 @@
 
 #include "Commands.h"
 #include "Errors.h"
-#include "NameMatch.h"
+#include "Lookup.h"
 #include "Output.h"
 #include "ReferenceText.h"
 
@@ -24,22 +24,6 @@ struct ResolveOptions {
   bool nameAndID = false;
 };
 
-std::vector<Source> SourcesOf(Setup const& setup) {
-  std::vector<Source> sources;
-  for (int i = 0; i < setup.CountSources(); ++i) {
-    sources.push_back(setup.GetSource(i));
-  }
-  return sources;
-}
-
-std::vector<Destination> DestinationsOf(Setup const& setup) {
-  std::vector<Destination> destinations;
-  for (int i = 0; i < setup.CountDestinations(); ++i) {
-    destinations.push_back(setup.GetDestination(i));
-  }
-  return destinations;
-}
-
 template <class List>
 std::vector<std::string> NamesOf(List const& endpoints) {
   std::vector<std::string> names;
@@ -47,15 +31,6 @@ std::vector<std::string> NamesOf(List const& endpoints) {
     names.push_back(endpoint.GetName().string());
   }
   return names;
-}
-
-template <class List>
-Endpoint Find(List const& endpoints, std::string const& name, std::string const& kind) {
-  std::vector<Candidate> candidates;
-  for (auto const& endpoint : endpoints) {
-    candidates.push_back({endpoint.GetName().string(), endpoint.GetUniqueID()});
-  }
-  return endpoints[MatchName(candidates, name, kind)];
 }
 
 // A destination if it can be meant, else a source.

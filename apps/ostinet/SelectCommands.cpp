@@ -48,7 +48,7 @@ void ChangeMode(GlobalOptions const& globals, ModeOptions const& options) {
   session.RunFor(kUntilSent);
   PrintOne(globals.json, ModesJSON(destination), ModesLines(destination));
   if (!isCurrent) {
-    session.GetSetup().SignOut(true);
+    session.Save();
   }
 }
 
@@ -80,7 +80,7 @@ void NameNote(GlobalOptions const& globals, NoteOptions const& options) {
   PrintOne(globals.json, NoteJSON(pitch, name), {name});
   if (isEdit) {
     session.GetSetup().SaveEditedDestBanks();
-    session.GetSetup().SignOut(true);
+    session.Save();
   }
 }
 

@@ -59,6 +59,28 @@ std::unique_ptr<FolderPrefs> OpenSettings(std::string const& path) {
   return prefs;
 }
 
+// What a save must have changed: a new file took the place of the old one.
+class FileState {
+ public:
+  explicit FileState(File const& file) {
+    std::u16string const full = file.GetFullPath().utf16_str();
+    std::error_code error;
+    isThere_ = file.IsFile();
+    time_ = std::filesystem::last_write_time(std::filesystem::path(full), error);
+    if (isThere_) {
+      content_ = file.Read();
+    }
+  }
+  bool operator==(FileState const& other) const {
+    return isThere_ == other.isThere_ && time_ == other.time_ && content_ == other.content_;
+  }
+
+ private:
+  bool isThere_ = false;
+  std::filesystem::file_time_type time_{};
+  std::vector<unsigned char> content_;
+};
+
 void NotifyError(std::exception_ptr const& error) {
   try {
     std::rethrow_exception(error);
@@ -89,6 +111,9 @@ Session::Session(GlobalOptions const& options, Receiver* receiver, SetupListener
   if (!why.empty()) {
     Notify(why);
   }
+  if (prefs_ != nullptr) {
+    virtualEndpoints_.Load(FileInSettings(kVirtualEndpointsFile));
+  }
   SignIn(receiver, listener);
 }
 
@@ -100,16 +125,47 @@ void Session::SignIn(Receiver* receiver, SetupListener* listener) {
     throw Failure(SignInSentence(result));
   }
   setup.SetListener(listener);
+  virtualEndpoints_.Make(setup);
+}
+
+File Session::FileInSettings(char const* name) const {
+  Folder folder;
+  prefs_->GetFolder(folder);
+  return folder.GetFile(UString(name));
+}
+
+void Session::Save() {
+  if (prefs_ == nullptr) {
+    throw Failure(
+        "there is no folder for settings to keep this in: name one with --settings FOLDER");
+  }
+  FileState const before(FileInSettings("Ostinet.xml"));
+  GetSetup().SetListener(nullptr);
+  GetSetup().SignOut(true);
+  FailIfSettingsFailed();
+  // The library saves without a word, so what it left behind has to tell.
+  if (before == FileState(FileInSettings("Ostinet.xml"))) {
+    throw Failure("the studio could not be saved in \"" +
+                  FileInSettings("Ostinet.xml").GetFullPath().string() + "\"; it is as it was");
+  }
+  virtualEndpoints_.Save(FileInSettings(kVirtualEndpointsFile));
+}
+
+void Session::FailIfSettingsFailed() const {
+  if (!prefs_->LastError().empty()) {
+    throw Failure("settings could not be kept: " + prefs_->LastError());
+  }
 }
 
 Session::~Session() {
+  bool const wasSignedIn = GetSetup().IsSignedIn();
   try {
     GetSetup().SetListener(nullptr);
     GetSetup().SignOut(false);
   } catch (std::exception const& error) {
     Notify(error.what());
   }
-  if (prefs_ != nullptr && !prefs_->LastError().empty()) {
+  if (wasSignedIn && prefs_ != nullptr && !prefs_->LastError().empty()) {
     Notify("settings could not be kept: " + prefs_->LastError());
   }
 }

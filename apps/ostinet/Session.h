@@ -6,6 +6,7 @@
 #include <optional>
 #include <string>
 
+#include "VirtualEndpoints.h"
 #include "ostinet/Setup.h"
 #include "ostinet/hostkit/FolderPrefs.h"
 #include "ostinet/hostkit/HostCallbacks.h"
@@ -20,8 +21,9 @@ struct GlobalOptions {
   std::string settings;  ///< a folder; empty: the user's own
 };
 
-/// The studio, signed in for as long as this lives. Signing out saves nothing: a command that only
-/// looks or plays must not write over what another program has edited meanwhile.
+/// The studio, signed in for as long as this lives, with the user's virtual endpoints in it. Its
+/// end saves nothing: a command that only looks or plays must not write over what another program
+/// has edited meanwhile. A command that edits calls Save.
 ///
 /// Threads      The main thread, which runs the loop.
 /// Errors       Failure, with one sentence for people.
@@ -33,6 +35,13 @@ class Session : private Noncopyable<Session> {
 
   Setup& GetSetup() const { return Setup::Instance(); }
 
+  /// The user's virtual endpoints, to be edited.
+  VirtualEndpoints& GetVirtualEndpoints() { return virtualEndpoints_; }
+
+  /// Signs out and keeps what was edited: the last thing that a command does. Throws Failure where
+  /// it could not be kept; the files are then as they were.
+  void Save();
+
   /// Runs the studio until `goOn` returns false or Ctrl-C is pressed. `goOn` is asked every few
   /// milliseconds; what it throws ends the run and travels on.
   void Run(std::function<bool()> const& goOn);
@@ -42,10 +51,13 @@ class Session : private Noncopyable<Session> {
 
  private:
   void SignIn(Receiver* receiver, SetupListener* listener);
+  File FileInSettings(char const* name) const;
+  void FailIfSettingsFailed() const;
 
   std::unique_ptr<FolderPrefs> prefs_;
   PollLoop loop_;
   HostCallbacks callbacks_;
+  VirtualEndpoints virtualEndpoints_;
 };
 
 /// When a command that listens ends by itself.

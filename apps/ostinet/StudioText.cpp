@@ -1,6 +1,10 @@
 // SPDX-License-Identifier: MIT
 #include "StudioText.h"
 
+#include <algorithm>
+#include <charconv>
+#include <sstream>
+
 namespace Ostinet::Tool {
 namespace {
 
@@ -118,6 +122,41 @@ std::string ChannelsText(unsigned short mask) {
     first = last;
   }
   return text.empty() ? "none" : text;
+}
+
+namespace {
+
+// A channel from 1 to 16 that takes the whole text.
+std::optional<int> ParseChannel(std::string const& text) {
+  int channel = 0;
+  char const* const end = text.data() + text.size();
+  auto const [stop, error] = std::from_chars(text.data(), end, channel);
+  bool const isChannel = error == std::errc() && stop == end && channel >= 1 && channel <= 16;
+  return isChannel ? std::optional<int>(channel) : std::nullopt;
+}
+
+}  // namespace
+
+std::optional<unsigned short> ParseChannels(std::string const& text) {
+  if (text == "all") {
+    return kAllChannels;
+  }
+  std::string compact = text;
+  compact.erase(std::remove(compact.begin(), compact.end(), ' '), compact.end());
+  std::istringstream ranges(compact + ",");
+  unsigned short mask = 0;
+  for (std::string range; std::getline(ranges, range, ',');) {
+    size_t const dash = range.find('-');
+    auto const first = ParseChannel(range.substr(0, dash));
+    auto const last = dash == range.npos ? first : ParseChannel(range.substr(dash + 1));
+    if (!first || !last || *last < *first) {
+      return std::nullopt;
+    }
+    for (int channel = *first; channel <= *last; ++channel) {
+      mask = static_cast<unsigned short>(mask | 1 << (channel - 1));
+    }
+  }
+  return mask;
 }
 
 }  // namespace Ostinet::Tool

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -19,5 +20,8 @@ std::string PlayingText(PlayingView const& patch);
 
 /// "1-4, 10" for a mask of channels, of which bit 0 is channel 1; "none" for 0.
 std::string ChannelsText(unsigned short mask);
+
+/// The mask of such a text, or of "all"; nothing for a text that names no channel.
+std::optional<unsigned short> ParseChannels(std::string const& text);
 
 }  // namespace Ostinet::Tool

@@ -43,6 +43,7 @@ EndpointView ViewEndpoint(EndpointHandle const& endpoint) {
   view.isSource = std::is_same_v<EndpointHandle, Source>;
   if (auto const direct = DirectOf(endpoint); direct.GetImplPtr() != nullptr) {
     view.port = Text(direct.GetName());
+    view.portKey = direct.GetKey();
   }
   for (int i = 0; i < CountConnected(endpoint); ++i) {
     view.connected.push_back(Text(ConnectedOf(endpoint, i).GetName()));

@@ -39,6 +39,7 @@ struct EndpointView {
   std::optional<bool> isInterface;
   int scheduleAheadMuSec = 0;
   std::optional<std::string> port;     ///< of an instrument: the port that it hangs on
+  unsigned long long portKey = 0;      ///< that port's key
   std::vector<std::string> connected;  ///< of a port: what hangs on it
   std::vector<PlayingView> playing;    ///< of a destination: what AddPlaying found
 

@@ -1,11 +1,10 @@
 // SPDX-License-Identifier: MIT
 #include <CLI/CLI.hpp>
-#include <algorithm>
 
 #include "Commands.h"
 #include "Errors.h"
-#include "NameMatch.h"
 #include "Output.h"
+#include "TypeLookup.h"
 #include "TypesText.h"
 
 namespace Ostinet::Tool {
@@ -24,38 +23,6 @@ void Print(bool asJSON, std::string const& json, std::vector<std::string> const&
   for (std::string const& line : lines) {
     PrintLine(line);
   }
-}
-
-// In the order of the catalog, which is sorted but for the types at its end that no file describes.
-MakerCounts MakersOf(DeviceTypeCatalog const& catalog) {
-  sorted_vector_set<UString> names;
-  catalog.CollectManufacturers(names);
-  MakerCounts makers;
-  for (UString const& name : names) {
-    std::vector<DeviceTypeInfo> types;
-    catalog.CollectModels(name, types);
-    makers.emplace_back(name.string(), static_cast<int>(types.size()));
-  }
-  std::stable_sort(makers.begin(), makers.end(), [](auto const& a, auto const& b) {
-    return UString(a.first).less(UString(b.first), UString::kForPeople);
-  });
-  return makers;
-}
-
-std::string FindMaker(MakerCounts const& makers, std::string const& wanted) {
-  std::vector<Candidate> candidates;
-  for (auto const& maker : makers) {
-    candidates.push_back({maker.first, 0});
-  }
-  return candidates[MatchName(candidates, wanted, "maker")].name;
-}
-
-DeviceTypeInfo FindModel(std::vector<DeviceTypeInfo> const& types, std::string const& wanted) {
-  std::vector<Candidate> candidates;
-  for (DeviceTypeInfo const& type : types) {
-    candidates.push_back({type.GetModelName().string(), 0});
-  }
-  return types[MatchName(candidates, wanted, "model")];
 }
 
 void ListTypes(bool asJSON, std::vector<std::string> const& words) {

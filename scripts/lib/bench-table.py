@@ -20,6 +20,7 @@ SUBJECT_AIMS = {
     "send, WinMM, stamped": 2.0,
     "send, DirectMusic": 2.0,
     "queue": 1.0,
+    "setup file, load": 4.0,
     "names, a document read": 2.5,
     "names catalog of 1,000, start": 1.0 / 50,
     "autodetect, a byte matched": 3.0,

@@ -160,6 +160,10 @@ std::string UString::string(ByteEncoding encoding, char replacement, bool leaveO
   std::string bytes;
   bytes.reserve(length());
   for (size_type position = 0; position < length();) {
+    if (units_[position] < 0x80) {  // the same in every encoding, and most of every path
+      bytes.push_back(static_cast<char>(units_[position++]));
+      continue;
+    }
     char32_t const character = Impl::NextCharacter(units_, position);
     Encode(character, encoding, replacement, leaveOut, bytes);
   }

@@ -15,7 +15,7 @@ void Walk(Folder const& folder, UString const& ending, XMLFilesVisitor& visitor,
   for (FolderIterator entry(folder); !entry.AtEnd(); ++entry) {
     if (entry.IsFolder()) {
       Walk(Folder(*entry), ending, visitor, inUserFolder);
-    } else if (HasEnding(entry->GetName(), ending)) {
+    } else if (HasEnding(entry->GetFullPath(), ending)) {
       visitor.Visit(File(*entry), inUserFolder);
     }
   }

@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "model/PropertyKeys.h"
+#include "model/SlotDescriptor.h"
 #include "model/XMLNames.h"
 
 namespace Ostinet::Impl {
@@ -67,11 +68,13 @@ ModelInfo DeviceObjectImpl::GetModelInfo() const {
   return info;
 }
 
-SlotID DeviceObjectImpl::GetSlotID() const {
+SlotID DeviceObjectImpl::GetSlotID() const { return SlotIDOf(*peer_); }
+
+SlotID SlotIDOf(ImplImpl const& peer) {
   SlotID slot;
   std::vector<int> words;
   constexpr std::size_t kWords = 6;
-  if (peer_->GetIntList(Keys::kSlotDescriptor, words) && words.size() >= kWords) {
+  if (peer.GetIntList(Keys::kSlotDescriptor, words) && words.size() >= kWords) {
     for (std::size_t i = 0; i < kWords; ++i) {
       slot.words[i] = static_cast<unsigned int>(words[i]);
     }

@@ -26,35 +26,41 @@ long long Now() {
 class Visitor : public XMLFilesVisitor {
  public:
   Visitor(std::vector<NameDocumentDigest>& old, std::vector<NameDocumentDigest>& found)
-      : found_(found) {
-    for (NameDocumentDigest& digest : old) {
-      unclaimed_.emplace(Key(digest.inUserFolder, digest.file), &digest);
-    }
+      : next_(old.begin()), end_(old.end()), found_(found) {
+    found_.reserve(old.size());
   }
 
   void Visit(File const& file, bool inUserFolder) override {
-    NameDocumentDigest digest;
+    FileModDate date;
     try {
-      digest.modDate = file.GetModDate();
+      date = file.GetModDate();
     } catch (VantorError const&) {
       return;  // gone since the folder was listed
     }
+    NameDocumentDigest* const known = Claim(file, inUserFolder);
+    if (known != nullptr && known->modDate == date) {
+      found_.push_back(std::move(*known));
+      return;
+    }
+    NameDocumentDigest& digest = found_.emplace_back();
     digest.file = file;
     digest.inUserFolder = inUserFolder;
-    if (NameDocumentDigest* const known = Claim(digest)) {
-      if (known->modDate == digest.modDate) {
-        found_.push_back(std::move(*known));
-        return;
-      }
-    }
-    found_.push_back(std::move(digest));
+    digest.modDate = date;
   }
 
  private:
   using Key = std::pair<bool, FileSpecification>;
 
-  NameDocumentDigest* Claim(NameDocumentDigest const& digest) {
-    auto const place = unclaimed_.find(Key(digest.inUserFolder, digest.file));
+  // Mostly the walk meets what it met the last time, in the same order. At the first difference
+  // what is left is indexed.
+  NameDocumentDigest* Claim(FileSpecification const& file, bool inUserFolder) {
+    if (next_ != end_ && next_->inUserFolder == inUserFolder && next_->file == file) {
+      return &*next_++;
+    }
+    for (; next_ != end_; ++next_) {
+      unclaimed_.emplace(Key(next_->inUserFolder, next_->file), &*next_);
+    }
+    auto const place = unclaimed_.find(Key(inUserFolder, file));
     if (place == unclaimed_.end()) {
       return nullptr;
     }
@@ -63,8 +69,10 @@ class Visitor : public XMLFilesVisitor {
     return known;
   }
 
+  std::vector<NameDocumentDigest>::iterator next_;  // up to here all are claimed or indexed
+  std::vector<NameDocumentDigest>::iterator const end_;
   std::vector<NameDocumentDigest>& found_;
-  std::map<Key, NameDocumentDigest*> unclaimed_;  // into the old ones, the first of each file
+  std::map<Key, NameDocumentDigest*> unclaimed_;  // the first of each file
 };
 
 }  // namespace

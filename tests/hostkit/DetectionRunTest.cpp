@@ -455,6 +455,23 @@ TEST_F(Detection, HasTheInputToItselfAndGivesItBack) {
   EXPECT_EQ(receiver.packets.size(), 1u);
 }
 
+// The callbacks of the system ask the receiver of the sign-in alone.
+TEST_F(Detection, HearsWhatTheReceiverOfTheSignInWants) {
+  options.requests = {Simple("42")};
+  receiver.filter = [](Bytes const&) { return false; };
+  Begin();
+  Arrive("F0 42 02 05 F7");
+  EXPECT_THAT(Run().Ports()[0].findings, IsEmpty());
+  receiver.filter = [](Bytes const& bytes) {
+    DataPacket packet;
+    packet.data = bytes.data();
+    packet.length = bytes.size();
+    return DetectionRun::IsSysex(packet);
+  };
+  Arrive("F0 42 02 05 F7");
+  EXPECT_EQ(Run().Ports()[0].findings.size(), 1u);
+}
+
 TEST_F(Detection, GivesBackTheReceiverThatASourceHad) {
   options.requests = {Simple("42")};
   SignIn();

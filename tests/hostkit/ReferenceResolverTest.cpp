@@ -1,6 +1,6 @@
 // SPDX-License-Identifier: MIT
 //
-// A host's document meets a studio that changed.
+// The answers of the resolver, on studios of any shape.
 #include <gtest/gtest.h>
 
 #include <random>
@@ -56,70 +56,6 @@ TEST_F(ReferenceResolverTest, FindsAnEndpointThatStayed) {
   EXPECT_EQ(answer.Winner()->levels.size(), 4u);
   EXPECT_EQ(answer.InWords(), "Pad: same ID, same name, same model");
   EXPECT_TRUE(answer.runnersUp.empty());
-}
-
-TEST_F(ReferenceResolverTest, FollowsARename) {
-  Destination const port = Port("MIDI 1", 42);
-  Port("MIDI 2", 43);
-  MatchData const saved = port.GetMatchData();
-  port.SetRawName("Strings");
-  auto const answer = Resolve(saved);
-  ASSERT_EQ(answer.outcome, Outcome::kFound);
-  EXPECT_EQ(answer.Winner()->destination, port);
-  EXPECT_EQ(answer.Winner()->InWords(), "same ID, other name");
-}
-
-TEST_F(ReferenceResolverTest, FindsAPortThatCameBackAsAnotherObject) {
-  MatchData const saved = Port("MIDI 1", 42).GetMatchData();
-  setup.DeleteBareEndpoint(setup.GetDestination(0));
-  setup.Reset();
-  Destination const back = Port("MIDI 1", 4711);
-  auto const answer = Resolve(saved);
-  ASSERT_EQ(answer.outcome, Outcome::kFound);
-  EXPECT_EQ(answer.Winner()->destination, back);
-  EXPECT_EQ(answer.Winner()->InWords(), "other ID, same name");
-}
-
-TEST_F(ReferenceResolverTest, FollowsAnInstrumentToANewInterface) {
-  Destination const old = Port("Old interface", 1);
-  Destination const pad = Instrument("Pad", 42);
-  old.AddConnectedDestination(pad);
-  MatchData const saved = pad.GetMatchData();
-  Destination const bought = Port("New interface", 2);
-  old.RemoveConnectedDestination(pad);
-  bought.AddConnectedDestination(pad);
-  TestSetup::SetInt(pad, "uniqueID", 0);
-  auto const answer = Resolve(saved);
-  ASSERT_EQ(answer.outcome, Outcome::kFound);
-  EXPECT_EQ(answer.Winner()->destination, pad);
-  EXPECT_EQ(answer.Winner()->InWords(), "other ID, same name, other interface");
-}
-
-TEST_F(ReferenceResolverTest, FindsTheSameModelOnAnotherMachine) {
-  MatchData const saved = Instrument("Jim's Pad", 42, "Acme", "Synth 1").GetMatchData();
-  setup.Reset();
-  Destination const theirs = Instrument("Rack", 900, "ACME", "Synth 1");
-  Instrument("Bass", 901, "Best", "Bass");
-  auto const answer = Resolve(saved);
-  ASSERT_EQ(answer.outcome, Outcome::kFound);
-  EXPECT_EQ(answer.Winner()->destination, theirs);
-  EXPECT_EQ(answer.Winner()->weight, 2);
-  EXPECT_EQ(answer.Winner()->InWords(), "other ID, other name, same model but for case and blanks");
-}
-
-TEST_F(ReferenceResolverTest, DoesNotGuessBetweenIdenticalInterfaces) {
-  MatchData const saved = Port("USB MIDI", 42).GetMatchData();
-  setup.Reset();
-  Destination const first = Port("USB MIDI", 1);
-  Port("Other", 2);
-  Destination const second = Port("USB MIDI", 3);
-  auto const answer = Resolve(saved);
-  ASSERT_EQ(answer.outcome, Outcome::kAmbiguous);
-  ASSERT_EQ(answer.best.size(), 2u);
-  EXPECT_EQ(answer.best[0].destination, first);
-  EXPECT_EQ(answer.best[1].destination, second);
-  EXPECT_EQ(answer.Winner(), nullptr);
-  EXPECT_EQ(answer.InWords(), "2 fit equally well (other ID, same name): USB MIDI, USB MIDI");
 }
 
 TEST_F(ReferenceResolverTest, TellsIdenticalInterfacesApartByTheirIDs) {

@@ -3,6 +3,7 @@
 // What ships is enough to recognise what the tables know: every identity and every request of a
 // maker's own, row by row.
 #include <algorithm>
+#include <cstdio>
 #include <fstream>
 #include <map>
 #include <set>

@@ -94,6 +94,22 @@ TEST_F(NamesCatalogTest, ATouchedDocumentIsParsedAgainAndAnUntouchedOneIsNot) {
   EXPECT_EQ(CountParsed([&] { EXPECT_TRUE(FindMaster().Exists()); }), 1);
 }
 
+TEST_F(NamesCatalogTest, DocumentsThatComeAndGoLeaveTheOthersParsed) {
+  for (char const* path : {"user/B.midnam", "user/D.midnam", "user/F.midnam", "system/B.midnam"}) {
+    folders.Write(path, NameDocument(Master("Acme", "Two")));
+  }
+  FindMaster();
+  folders.Write("user/A.midnam", NameDocument(Master("Acme", "Two")));
+  folders.Write("user/E.midnam", NameDocument(Master("Acme", "One")));
+  folders.Remove("user/D.midnam");
+  folders.PassSeconds(60);
+  EXPECT_EQ(CountParsed([&] { EXPECT_TRUE(FindMaster().Exists()); }), 2);
+  folders.Remove("user/B.midnam");
+  folders.PassSeconds(60);
+  EXPECT_EQ(CountParsed([&] { FindMaster(); }), 0);
+  EXPECT_EQ(NamesCatalogImpl::Instance().GetDocuments().size(), 4U);
+}
+
 TEST_F(NamesCatalogTest, ADocumentIsOpenedOnlyWhenASearchReachesIt) {
   folders.Write("user/A.midnam", NameDocument(StandardMode("General MIDI")));
   folders.Write("user/B.midnam", NameDocument(Master("Acme", "One")));

@@ -128,6 +128,87 @@ TEST_F(DirectMusicPort, AnInputIsDeactivatedWhenItIsLetGo) {
   EXPECT_EQ(Log({"Activate"}).size(), 1u);
 }
 
+// A host may hold an endpoint beyond the end of the session.
+TEST_F(DirectMusicPort, AnOutputStaysActiveUntilItsObjectDies) {
+  Destination held = Open(SimulatedPort());
+  midi.LogCalls(true);
+  midi.TakeLog();
+  SignOut();
+  EXPECT_TRUE(Log({"Activate"}).empty());
+  EXPECT_EQ(midi.CountObjects("IDirectMusicPort"), 1);
+  held = Destination();
+  EXPECT_EQ(midi.CountObjects("IDirectMusicPort"), 0);
+}
+
+TEST_F(DirectMusicPort, AnOutputDoesNotExistOnceItIsDeactivated) {
+  Destination const held = Open(SimulatedPort());
+  ASSERT_TRUE(held.Exists());
+  SignOut();
+  EXPECT_EQ(midi.CountObjects("IDirectMusicPort"), 1) << "the port is still there";
+  EXPECT_FALSE(held.Exists());
+  held.SetModel(UString("x"));
+  midi.SetStepPerReading(1);
+  SignIn();
+  midi.SetStepPerReading(0);
+  setup.PollSetupChanges();
+  listener.setupChanges = 0;
+  held.SetModel(UString("y"));
+  setup.PollSetupChanges();
+  EXPECT_EQ(listener.setupChanges, 0) << "a dead endpoint tells of no change";
+}
+
+TEST_F(DirectMusicPort, AnInputIsReleasedWhileItsObjectLives) {
+  AddNative("In", Kind::kDirectMusicIn);
+  SignIn();
+  Source const held = Src("In");
+  midi.LogCalls(true);
+  midi.TakeLog();
+  SignOut();
+  EXPECT_EQ(Log({"Activate"}).size(), 1u);
+  EXPECT_EQ(midi.CountObjects("IDirectMusicPort"), 0);
+  EXPECT_FALSE(held.Exists());
+}
+
+class LegacyPort : public PlatformTest {
+ protected:
+  // A device that the system refuses to close stays open for good: a system of its own.
+  LegacyPort() {
+    SimulatedPort port;
+    port.name = "Out";
+    port.technology = 1;
+    own.AddPort(port);
+    own.Install();
+    SignIn();
+  }
+  ~LegacyPort() override {
+    SignOut();
+    midi.Install();
+  }
+  SimulatedMIDI own;
+};
+
+// Hosts see that the device is not closed then.
+TEST_F(LegacyPort, AnOutputThatDoesNotResetStaysOpen) {
+  own.Fail("midiOutReset");
+  SignOut();
+  EXPECT_EQ(own.CountCalls("midiOutClose"), 0u);
+  EXPECT_EQ(own.CountOpenDevices(), 1);
+}
+
+TEST_F(LegacyPort, AnOutputThatResetsIsClosed) {
+  SignOut();
+  EXPECT_EQ(own.CountCalls("midiOutClose"), 1u);
+  EXPECT_EQ(own.CountOpenDevices(), 0);
+}
+
+TEST_F(LegacyPort, AnOutputDoesNotExistOnceItIsDeactivated) {
+  Destination const held = Dest("Out");
+  ASSERT_TRUE(held.Exists());
+  SignOut();
+  EXPECT_FALSE(held.Exists());
+  EXPECT_FALSE(held.IsOnline());
+}
+
 class Editing : public PlatformTest {
  protected:
   Editing() { SignIn(); }

@@ -2,6 +2,7 @@
 
 #include <stdexcept>
 
+#include "model/EndpointImpl.h"
 #include "ostinet/SysexRef.h"
 #include "platform/PlatformTest.h"
 
@@ -135,11 +136,28 @@ TEST_F(LegacyInput, AFilterThatThrowsLosesThePacketOnly) {
   EXPECT_THAT(receiver.AllBytes(), ElementsAre(Bytes{0x90, 2, 1}));
 }
 
+// The system counts milliseconds from the start of the input, the stamp from the host's zero.
 TEST_F(LegacyInput, IsStampedFromItsStart) {
+  constexpr long long kMillisecond = 10000;
+  SignOut();
+  midi.MoveClockByHand(1000 * kMillisecond);
+  midi.SetStepPerReading(1);
+  SignIn();
+  midi.SetStepPerReading(0);
+  ASSERT_LT(midi.Now(), 1001 * kMillisecond) << "the sign-in took a reading too many for this test";
+  auto const stampAfter = [](long long milliseconds) {
+    double const start = 1000 / 1000.0;
+    return EventTimeToMIDITime(start + static_cast<double>(milliseconds) / 1000.0).Value();
+  };
+  ASSERT_TRUE(midi.AdvanceClocks(5 * kMillisecond));
   Arrive({0x90, 1, 1});
-  setup.ProcessInput();
-  ASSERT_EQ(receiver.packets.size(), 1u);
-  EXPECT_NE(receiver.packets[0].clocks, 0u);
+  ASSERT_TRUE(midi.AdvanceClocks(250 * kMillisecond));
+  Arrive({0x90, 2, 1});
+  ASSERT_TRUE(midi.AdvanceClocks(kMillisecond));
+  setup.ProcessInput();  // later, which no stamp shows
+  ASSERT_EQ(receiver.packets.size(), 2u);
+  EXPECT_EQ(receiver.packets[0].clocks, stampAfter(5));
+  EXPECT_EQ(receiver.packets[1].clocks, stampAfter(255));
 }
 
 TEST_F(LegacyInput, OpensAndClosesInOrder) {
@@ -309,6 +327,39 @@ TEST_F(VirtualPair, ItsEndsShareTheirProperties) {
   EXPECT_EQ(source.GetManufacturer(), UString("Acme"));
   EXPECT_EQ(source.GetName(), UString("Bus"));
   EXPECT_EQ(destination.GetName(), UString("Bus"));
+}
+
+TEST_F(VirtualPair, RemovingAPropertyOnEitherEndRemovesItOnBoth) {
+  source.SetManufacturer(UString("Acme"));
+  Impl::ImplImpl& end =
+      *static_cast<Impl::EndpointImpl*>(static_cast<Impl::ObjectImpl*>(destination.GetImplPtr()))
+           ->Peer();
+  end.RemoveProperty("manufacturer");
+  EXPECT_EQ(source.GetManufacturer(), UString());
+  EXPECT_TRUE(end.IsFake());
+  EXPECT_FALSE(end.IsPregen());
+  EXPECT_EQ(end.GetSynapMIDIPort(), nullptr);
+}
+
+// Whoever still holds the destination may go on writing to it.
+TEST_F(VirtualPair, ADestinationWhoseSourceWentFirstKeepsItsOwnProperties) {
+  setup.DeleteVirtualEndpoint(source);
+  source = Source();
+  setup.PollSetupChanges();  // which lets go of what it had noted
+  ASSERT_EQ(destination.GetRawName(), UString());
+  destination.SetRawName(UString("Left over"));
+  EXPECT_EQ(destination.GetRawName(), UString("Left over"));
+  Send(destination, {0x90, 60, 64});
+  destination.FlushOutput();
+  setup.ProcessInput();
+  EXPECT_THAT(receiver.packets, IsEmpty());
+}
+
+TEST_F(VirtualPair, FlushingTakesNothingBack) {
+  Send(destination, {0x90, 60, 64});
+  destination.FlushOutput();
+  setup.ProcessInput();
+  EXPECT_EQ(receiver.packets.size(), 1u);
 }
 
 TEST_F(VirtualPair, IsDeletedByEitherEnd) {

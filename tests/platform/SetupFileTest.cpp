@@ -1,8 +1,10 @@
 // SPDX-License-Identifier: MIT
 
+#include <algorithm>
 #include <filesystem>
 #include <fstream>
 #include <iterator>
+#include <map>
 
 #include "core/AtomicFile.h"
 #include "platform/PlatformTest.h"
@@ -157,6 +159,104 @@ TEST_F(SetupFile, ASaveThatFailsAtAnyWriteKeepsTheOldFile) {
     }
   }
   EXPECT_NE(Read().find("changed"), std::string::npos);
+}
+
+// At each step of a save, what a crash would leave behind is the old file, whole.
+TEST_F(SetupFile, ACrashAtAnyStepOfASaveLeavesTheOldFile) {
+  SignIn();
+  for (int i = 0; i < 150; ++i) {  // so many that it takes several writes
+    setup.CreateDevice(UString("Synth")).SetChannelName(0, UString(std::string(500, 'x')));
+  }
+  SignOut(true);
+  std::string const old = Read();
+  SignIn();
+  setup.GetDevice(0).SetRawName(UString("changed"));
+  std::map<Impl::AtomicFile::Step, int> steps;
+  Impl::AtomicFile::SetFaultHook([&](Impl::AtomicFile::Step step) {
+    ++steps[step];
+    EXPECT_EQ(Read() == old, true) << steps.size();
+    return 0;
+  });
+  SignOut(true);
+  Impl::AtomicFile::SetFaultHook({});
+  EXPECT_GT(steps[Impl::AtomicFile::Step::kWrite], 1);
+  EXPECT_EQ(steps.size(), 5u) << "created, written, flushed, closed and put in place";
+  EXPECT_NE(Read().find("changed"), std::string::npos);
+}
+
+// What a crash leaves beside the file.
+TEST_F(SetupFile, ALeftOverOfACrashDisturbsNoSaveAndNoLoad) {
+  prefs.MakeFile(".Ostinet.xml.1-1.tmp", "<Ostinet><Devi");
+  AddOut("Out");
+  SignIn();
+  Dest("Out").SetModel(UString("kept"));
+  SignOut(true);
+  SignIn();
+  EXPECT_EQ(Dest("Out").GetModel(), UString("kept"));
+}
+
+// Connections come back by the stored IDs; the element is for imports.
+TEST_F(SetupFile, TheConnectionElementIsNotReadAtLoad) {
+  AddOut("Out");
+  WriteWhole(
+      "<Device direct=\"false\">" + Properties("Synth", 10) + "<Entity direct=\"false\">" +
+      Properties("Port", 11) + "<Destination direct=\"false\" software=\"false\">" +
+      Properties("In", 12) +
+      "<Connection name=\"Out\" manufacturer=\"\" model=\"\"/></Destination></Entity></Device>");
+  SignIn();
+  setup.PollSetupChanges();
+  EXPECT_FALSE(setup.GetDevice(0).GetEntity(0).GetDestination(0).GetDirectDestination().Exists());
+}
+
+TEST_F(SetupFile, AnImportWhosePortIsNotThereIsReadToItsEnd) {
+  SignIn();
+  std::string const end =
+      "<Destination direct=\"false\" software=\"false\">" + Properties("In", 12) +
+      "<Connection name=\"Nowhere\" manufacturer=\"\" model=\"\"/></Destination>";
+  UString const path =
+      prefs.MakeFile("device.xml", "<Device direct=\"false\">" + Properties("Synth", 10) +
+                                       "<Entity direct=\"false\">" + Properties("Port", 11) + end +
+                                       end + "</Entity></Device>");
+  XMLLib::Parser parser{File(FileSpecification(path))};
+  ASSERT_TRUE(parser.DownToChild());
+  Entity const entity = setup.CreateDevice(parser).GetEntity(0);
+  ASSERT_EQ(entity.CountDestinations(), 2);
+  EXPECT_FALSE(entity.GetDestination(1).GetDirectDestination().Exists());
+}
+
+TEST_F(SetupFile, ADirectDeviceIsNotImported) {
+  SignIn();
+  UString const path = prefs.MakeFile("device.xml", "<Device direct=\"true\"/>");
+  XMLLib::Parser parser{File(FileSpecification(path))};
+  ASSERT_TRUE(parser.DownToChild());
+  EXPECT_FALSE(setup.CreateDevice(parser).Exists());
+  EXPECT_EQ(setup.CountDevices(), 0);
+}
+
+TEST_F(SetupFile, PrivateAndSoftwareEndpointsAreNotWritten) {
+  AddOut("Chip", 4);
+  SignIn();
+  setup.CreateVirtualEndpoint(UString("Hidden"), Setup::kNeitherEnd, Setup::kNeitherEnd);
+  SignOut(true);
+  EXPECT_EQ(Read().find("Chip"), std::string::npos);
+  EXPECT_EQ(Read().find("Hidden"), std::string::npos);
+}
+
+TEST_F(SetupFile, IsWrittenInTheOrderOfTheListsSourcesFirst) {
+  AddOut("B");
+  AddOut("A");
+  AddIn("Z");
+  SignIn();
+  setup.CreateDevice(UString("D 2"));
+  setup.CreateDevice(UString("D 1"));
+  SignOut(true);
+  std::string const saved = Read();
+  std::vector<std::size_t> places;
+  for (char const* const name : {">Z<", ">B<", ">A<", ">D 2<", ">D 1<"}) {
+    places.push_back(saved.find(name));
+  }
+  EXPECT_TRUE(std::is_sorted(places.begin(), places.end()));
+  EXPECT_NE(places.back(), std::string::npos);
 }
 
 TEST_F(SetupFile, AnImportedDeviceGetsNewIDsAndHangsOnThePortThatItNames) {

@@ -27,8 +27,9 @@ class DetectCommand : public ToolTest {
     arguments.insert(arguments.begin(), {"detect", "--json", "--timeout", kSeconds});
     ToolRun const run = RunOn(kStudio, arguments);
     EXPECT_EQ(run.exitCode, kDone) << run.err;
+    auto const lines = run.JSONLines();
     std::map<std::string, json> ports;
-    for (json const& port : run.JSONLines().at(0)["ports"]) {
+    for (json const& port : lines.at(0)["ports"]) {
       ports[port["name"].get<std::string>()] = port;
     }
     return ports;
@@ -98,7 +99,7 @@ TEST_F(DetectCommand, MakesDevicesThatAreThereAtTheNextStart) {
   ASSERT_NE(m1, nullptr);
   EXPECT_EQ((*m1)["device"]["name"], "M1");
 
-  json const studio = RunOn(kStudio, {"list", "--json"}).JSONLines().at(0);
+  json const studio = json::parse(RunOn(kStudio, {"list", "--json"}).out);
   ASSERT_EQ(studio["devices"].size(), 2u);
   for (json const& device : studio["devices"]) {
     bool const isM1 = device["name"] == "M1";
@@ -113,7 +114,8 @@ TEST_F(DetectCommand, MakesDevicesThatAreThereAtTheNextStart) {
   // A second time there is nothing to make.
   auto const again = Detect({"desk", "--create"});
   EXPECT_TRUE((*FindModel(again.at("Desk Out"), "M1"))["device"].is_null());
-  EXPECT_EQ(RunOn(kStudio, {"list", "--json"}).JSONLines().at(0)["devices"].size(), 2u);
+  json const after = json::parse(RunOn(kStudio, {"list", "--json"}).out);
+  EXPECT_EQ(after["devices"].size(), 2u);
 }
 
 }  // namespace

@@ -94,5 +94,21 @@ TEST(ChannelsText, JoinsRuns) {
   EXPECT_EQ(ChannelsText(0x020F), "1-4, 10");
 }
 
+TEST(ParseChannels, ReadsWhatChannelsTextWrites) {
+  for (unsigned mask = 1; mask <= 0xFFFF; mask += 97) {
+    auto const channels = static_cast<unsigned short>(mask);
+    EXPECT_EQ(ParseChannels(ChannelsText(channels)), channels);
+  }
+  EXPECT_EQ(ParseChannels("all"), 0xFFFF);
+  EXPECT_EQ(ParseChannels("16"), 0x8000);
+}
+
+TEST(ParseChannels, TakesNothingElse) {
+  for (char const* const text : {"", "none", "0", "17", "1-", "-1", "3-2", "1,,2", "1,", "a", "1.5",
+                                 "1-2-3", "99999999999999999999"}) {
+    EXPECT_FALSE(ParseChannels(text).has_value()) << text;
+  }
+}
+
 }  // namespace
 }  // namespace Ostinet::Tool

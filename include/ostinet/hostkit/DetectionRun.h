@@ -22,7 +22,8 @@ namespace Ostinet {
 /// loop in the studio, counts for nothing.
 ///
 /// While it runs, the sources it listens to hand their input to it alone; in the end they get back
-/// the receivers that they had.
+/// the receivers that they had. Input comes as far as the receiver given at sign-in wants it, so
+/// that one has to want sysex.
 ///
 /// Ownership    The host's. It keeps handles, so ports may come and go meanwhile.
 /// Threads      The host's polling thread; WantsPacket [any thread].
@@ -112,6 +113,9 @@ class DetectionRun final : public Receiver, private Noncopyable<DetectionRun> {
   /// The ports in the order of the constructor, with what was found until now.
   std::vector<Port> const& Ports() const;
   Progress GetProgress() const;
+
+  /// Whether a packet is sysex or a piece of it: what a run has to hear. [any thread]
+  static bool IsSysex(DataPacket const& packet);
 
   /// For input that reaches the run by another way than its sources.
   bool WantsPacket(DataPacket const& packet, Source const& source) override;

@@ -1,0 +1,109 @@
+// SPDX-License-Identifier: MIT
+#include "VirtualEndpoints.h"
+
+#include <nlohmann/json.hpp>
+#include <utility>
+
+#include "Errors.h"
+#include "Lookup.h"
+#include "ReferenceText.h"
+
+// The file:
+//
+//   {"virtual": [{"name": "Loop", "public": "source", "reference": "0000..."}]}
+//
+// "public" is the end that shows, source or destination. "name" is for readers: the reference holds
+// it too.
+
+namespace Ostinet::Tool {
+namespace {
+
+using Json = nlohmann::ordered_json;
+
+char const* WordOf(Setup::SrcOrDest end) {
+  return end == Setup::kSourceEnd ? "source" : "destination";
+}
+
+Setup::SrcOrDest EndOf(std::string const& word) {
+  if (word != "source" && word != "destination") {
+    throw Failure("\"public\" is source or destination, not \"" + word + "\"");
+  }
+  return word == "source" ? Setup::kSourceEnd : Setup::kDestinationEnd;
+}
+
+VirtualEndpoints::Kept KeptOf(Json const& entry) {
+  return {EndOf(entry.at("public").get<std::string>()),
+          ParseReference(entry.at("reference").get<std::string>())};
+}
+
+Endpoint Shown(std::pair<Source, Destination> const& pair, Setup::SrcOrDest publicEnd) {
+  return publicEnd == Setup::kSourceEnd ? Endpoint(pair.first) : Endpoint(pair.second);
+}
+
+}  // namespace
+
+void VirtualEndpoints::Load(File const& file) {
+  if (!file.IsFile()) {
+    return;
+  }
+  try {
+    Json const content = Json::parse(file.Read());
+    for (Json const& entry : content.at("virtual")) {
+      loaded_.push_back(KeptOf(entry));
+    }
+  } catch (std::exception const& error) {
+    throw Failure("the virtual endpoints in \"" + file.GetFullPath().string() +
+                  "\" cannot be read: " + error.what());
+  }
+}
+
+void VirtualEndpoints::Make(Setup& setup) {
+  for (Kept const& kept : std::exchange(loaded_, {})) {
+    Endpoint const shown =
+        Shown(setup.CreateVirtualEndpoint(kept.reference, kept.publicEnd, kept.publicEnd),
+              kept.publicEnd);
+    if (shown.Exists()) {
+      pairs_.push_back({kept, shown});
+    }
+  }
+}
+
+void VirtualEndpoints::Save(File const& file) const {
+  if (!isEdited_) {
+    return;
+  }
+  Json list = Json::array();
+  for (Pair const& pair : pairs_) {
+    list.push_back({{"name", pair.kept.reference.GetObjectName().string()},
+                    {"public", WordOf(pair.kept.publicEnd)},
+                    {"reference", ReferenceText(pair.kept.reference)}});
+  }
+  Json const content = {{"virtual", list}};
+  std::string const text = content.dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
+  try {
+    file.Replace(text.data(), text.size());
+  } catch (std::exception const& error) {
+    throw Failure("the virtual endpoints could not be kept in \"" + file.GetFullPath().string() +
+                  "\": " + error.what());
+  }
+}
+
+Endpoint VirtualEndpoints::Add(Setup& setup, UString const& name, Setup::SrcOrDest publicEnd) {
+  Endpoint const shown = Shown(setup.CreateVirtualEndpoint(name, publicEnd, publicEnd), publicEnd);
+  pairs_.push_back({{publicEnd, shown.GetMatchData()}, shown});
+  isEdited_ = true;
+  return shown;
+}
+
+void VirtualEndpoints::Remove(Setup& setup, std::string const& name) {
+  std::vector<Endpoint> shown;
+  for (Pair const& pair : pairs_) {
+    shown.push_back(pair.shown);
+  }
+  auto const place = MatchName(CandidatesOf(shown), name, "virtual endpoint");
+  setup.DeleteVirtualEndpoint(shown[place]);
+  pairs_.erase(pairs_.begin() + static_cast<std::ptrdiff_t>(place));
+  isEdited_ = true;
+}
+
+}  // namespace Ostinet::Tool
