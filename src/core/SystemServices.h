@@ -38,8 +38,8 @@ std::optional<long long> ModificationTime(std::filesystem::path const& path);
 /// Names the calling thread for debuggers and lists of threads, and asks for its priority.
 void NameThisThread(UString const& name, int priority);
 
-/// One pointer for each thread. Where a thread ends with a pointer set, `free` is called with it, on
-/// that thread. Never destroyed in practice: threads may end after any static object did.
+/// One pointer for each thread. Where a thread ends with a pointer set, `free` is called with it,
+/// on that thread. Never destroyed in practice: threads may end after any static object did.
 class ThreadSlot {
  public:
   explicit ThreadSlot(void (*free)(void*));

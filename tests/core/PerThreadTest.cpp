@@ -1,11 +1,11 @@
 // SPDX-License-Identifier: MIT
-#include "core/PerThread.h"
-
 #include <gtest/gtest.h>
 
 #include <atomic>
 #include <thread>
 #include <vector>
+
+#include "core/PerThread.h"
 
 namespace Ostinet {
 namespace {

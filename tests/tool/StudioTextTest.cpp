@@ -62,9 +62,9 @@ TEST(StudioJSON, HasTheKeysThatScriptsRelyOn) {
   EXPECT_EQ(KeysOf(entity),
             (std::vector<std::string>{"name", "uniqueID", "sources", "destinations"}));
   std::vector<std::string> const endpointKeys = {
-      "name",     "uniqueID", "direct",   "online",      "software",           "internalSoftware",
-      "virtual",  "private",  "channels", "isInterface", "scheduleAheadMuSec", "port",
-      "connected"};
+      "name",      "uniqueID", "direct",   "online",      "software",           "internalSoftware",
+      "virtual",   "private",  "channels", "isInterface", "scheduleAheadMuSec", "port",
+      "connected", "playing"};
   EXPECT_EQ(KeysOf(entity["destinations"][0]), endpointKeys);
   EXPECT_EQ(KeysOf(studio["sources"][0]), endpointKeys);
 }
