@@ -26,7 +26,8 @@ constexpr char kStyle[] = R"(
   .rack { fill: #1f2937; }
   .row { fill: #f8fafc; stroke: #cbd5e1; stroke-width: 1; }
   .software { fill: #e0e7ff; stroke: #c7d2fe; }
-  .unused { opacity: 0.62; }
+  .unused text { fill: #64748b; }
+  .unused circle { opacity: 0.6; }
   .card { fill: #ffffff; stroke: #d7dde5; stroke-width: 1; }
   .off { opacity: 0.5; }
   .cable { fill: none; stroke-width: 2; stroke-linecap: round; }
