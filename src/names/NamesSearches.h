@@ -26,30 +26,30 @@ class FindMasterFunc : public NamesCatalogImpl::Func {
   Names result_;
 };
 
-/// All master documents of a model, one for each entry that matches.
-class FindMastersFunc : public NamesCatalogImpl::Func {
+/// A search that hands on what it finds for a model, as it goes.
+class CollectingSearch : public NamesCatalogImpl::Func {
  public:
-  FindMastersFunc(UString const& manufacturer, UString const& model, std::vector<Names>& out)
+  CollectingSearch(UString const& manufacturer, UString const& model, std::vector<Names>& out)
       : manufacturer_(manufacturer), model_(model), out_(out) {}
-  bool operator()(NameDocumentDigest const& digest) override;
 
- private:
+ protected:
   UString const& manufacturer_;
   UString const& model_;
   std::vector<Names>& out_;
 };
 
-/// The patch lists of every document that extends a model, of its first entry that matches.
-class FindOverridesFunc : public NamesCatalogImpl::Func {
+/// All master documents of a model, one for each entry that matches.
+class FindMastersFunc : public CollectingSearch {
  public:
-  FindOverridesFunc(UString const& manufacturer, UString const& model, std::vector<Names>& out)
-      : manufacturer_(manufacturer), model_(model), out_(out) {}
+  using CollectingSearch::CollectingSearch;
   bool operator()(NameDocumentDigest const& digest) override;
+};
 
- private:
-  UString const& manufacturer_;
-  UString const& model_;
-  std::vector<Names>& out_;
+/// The patch lists of every document that extends a model, of its first entry that matches.
+class FindOverridesFunc : public CollectingSearch {
+ public:
+  using CollectingSearch::CollectingSearch;
+  bool operator()(NameDocumentDigest const& digest) override;
 };
 
 /// The first document that defines a standard mode.
