@@ -46,11 +46,15 @@ target_compile_options(ostinet_settings INTERFACE
   $<$<CXX_COMPILER_ID:Clang>:-Wthread-safety>
   # g++ 12 sees overlapping copies in the sum of a literal and a std::string, once it optimises.
   $<$<AND:$<CXX_COMPILER_ID:GNU>,$<VERSION_LESS:$<CXX_COMPILER_VERSION>,13>>:-Wno-restrict>
-  # Optimising, GCC 12 takes the small buffers of boost::function and std::optional for unset.
+  # Optimising, GCC 12 takes the small buffers of boost::function and std::optional for unset. Clang
+  # keeps its eye on what is really unset.
   $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>
+  $<$<CXX_COMPILER_ID:GNU>:-Wno-uninitialized>
   # Nor does it know that the distance between two ends of a vector is never negative.
   $<$<AND:$<CXX_COMPILER_ID:GNU>,$<NOT:$<CONFIG:Debug>>>:-Wno-stringop-overread>
   $<$<AND:$<CXX_COMPILER_ID:GNU>,$<NOT:$<CONFIG:Debug>>>:-Wno-stringop-overflow>
+  # Where files are compiled together, what one has in its unnamed namespace may be its member.
+  $<$<AND:$<CXX_COMPILER_ID:GNU>,$<BOOL:${CMAKE_UNITY_BUILD}>>:-Wno-subobject-linkage>
   # Without a time in them, precompiled headers made anew are the same to the compiler cache.
   "$<$<CXX_COMPILER_ID:Clang>:SHELL:-Xclang -fno-pch-timestamp>"
   $<$<BOOL:${OSTINET_WARNINGS_AS_ERRORS}>:-Werror>)

@@ -17,7 +17,7 @@ struct KnownAnswer {
 
 /// An answer that fits a reply, and what it read from it.
 struct Hit {
-  std::size_t answer;  // its index
+  std::size_t answer = 0;  // its index
   unsigned char deviceID = 0xFF;
   Array<unsigned char, 7> captured = {{0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF}};
 };

@@ -2,14 +2,13 @@
 #include "DetectText.h"
 
 #include <algorithm>
-#include <nlohmann/json.hpp>
 
 #include "HexBytes.h"
+#include "JsonText.h"
 
 namespace Ostinet::Tool {
 namespace {
 
-using Json = nlohmann::ordered_json;
 using Outcome = DetectionRun::Outcome;
 
 struct OutcomeWords {
@@ -143,7 +142,7 @@ std::string DetectJSON(std::vector<DetectedPort> const& ports) {
                     {"instruments", findings}});
   }
   Json const all = {{"ports", list}};
-  return all.dump(-1, ' ', false, Json::error_handler_t::replace);
+  return JsonLine(all);
 }
 
 std::string ProgressLine(DetectionRun::Progress const& progress, std::string const& port,

@@ -1,17 +1,15 @@
 // SPDX-License-Identifier: MIT
 #include "DeviceProperties.h"
 
-#include <nlohmann/json.hpp>
 #include <optional>
 #include <variant>
 
 #include "Errors.h"
+#include "JsonText.h"
 #include "StudioText.h"
 
 namespace Ostinet::Tool {
 namespace {
-
-using Json = nlohmann::ordered_json;
 
 struct TextKind {
   UString (DeviceObject::*get)() const;
@@ -73,7 +71,7 @@ Property const kProperties[] = {
 };
 
 constexpr char kChannelPrefix[] = "channel-";
-constexpr int kChannels = 16;
+constexpr int kChannelCount = 16;
 
 std::string ChannelKey(int channel) { return kChannelPrefix + std::to_string(channel + 1); }
 
@@ -177,7 +175,7 @@ Property const* FindProperty(std::string const& key) {
 
 // The channel of a key like "channel-3", counted from 0.
 std::optional<int> ChannelOf(std::string const& key) {
-  for (int channel = 0; channel < kChannels; ++channel) {
+  for (int channel = 0; channel < kChannelCount; ++channel) {
     if (key == ChannelKey(channel)) {
       return channel;
     }
@@ -196,7 +194,7 @@ std::vector<NamedValue> ReadProperties(DeviceObject const& object) {
   for (Property const& property : kProperties) {
     values.push_back({property.key, std::visit(ReadText{object}, property.kind)});
   }
-  for (int channel = 0; channel < kChannels; ++channel) {
+  for (int channel = 0; channel < kChannelCount; ++channel) {
     std::string const name = object.GetChannelName(channel).string();
     if (!name.empty()) {
       values.push_back({ChannelKey(channel), name});
@@ -230,10 +228,10 @@ std::string PropertiesJSON(DeviceObject const& object) {
   for (Property const& property : kProperties) {
     json[property.key] = std::visit(ReadJson{object}, property.kind);
   }
-  for (int channel = 0; channel < kChannels; ++channel) {
+  for (int channel = 0; channel < kChannelCount; ++channel) {
     json[ChannelKey(channel)] = object.GetChannelName(channel).string();
   }
-  return json.dump(2, ' ', false, Json::error_handler_t::replace);
+  return JsonText(json);
 }
 
 std::string PropertiesHelp() {

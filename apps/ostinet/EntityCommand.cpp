@@ -16,7 +16,7 @@ struct EntityOptions {
   std::optional<int> outputs;
 };
 
-void New(GlobalOptions const& globals, EntityOptions const& options) {
+void NewEntity(GlobalOptions const& globals, EntityOptions const& options) {
   UString const name = NewName(options.entity, "entity");
   Session session(globals, nullptr, nullptr);
   Device const device = FindDevice(session.GetSetup(), options.device);
@@ -30,7 +30,7 @@ void New(GlobalOptions const& globals, EntityOptions const& options) {
   PrintNamed(globals, made);
 }
 
-void Delete(GlobalOptions const& globals, EntityOptions const& options) {
+void DeleteEntity(GlobalOptions const& globals, EntityOptions const& options) {
   Session session(globals, nullptr, nullptr);
   Device const device = FindDevice(session.GetSetup(), options.device);
   Entity const entity = Find(EntitiesOf(device), options.entity, "entity");
@@ -55,9 +55,9 @@ void AddEntityCommand(CLI::App& app, CommandLine& line) {
     });
     return command;
   };
-  AddEndpointCounts(*add("new", "Make an entity in a device", New), options->inputs,
+  AddEndpointCounts(*add("new", "Make an entity in a device", NewEntity), options->inputs,
                     options->outputs);
-  add("delete", "Delete an entity with its endpoints", Delete);
+  add("delete", "Delete an entity with its endpoints", DeleteEntity);
 }
 
 }  // namespace Ostinet::Tool

@@ -3,8 +3,8 @@
 
 #include <algorithm>
 #include <cstdio>
-#include <nlohmann/json.hpp>
 
+#include "JsonText.h"
 #include "MessageText.h"
 
 namespace Ostinet::Tool {
@@ -22,9 +22,9 @@ std::string MonitorText(MonitoredMessage const& message, bool hex) {
 }
 
 std::string MonitorJSON(MonitoredMessage const& message) {
-  nlohmann::ordered_json const json = {
+  Json const json = {
       {"source", message.source}, {"clocks", message.clocks}, {"bytes", ToHex(message.bytes)}};
-  return json.dump(-1, ' ', false, nlohmann::ordered_json::error_handler_t::replace);
+  return JsonLine(json);
 }
 
 std::string SecondsText(unsigned long long clocks, unsigned long long start) {

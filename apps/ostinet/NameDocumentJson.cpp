@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
-#include <nlohmann/json.hpp>
 
 #include "HexBytes.h"
+#include "JsonText.h"
 #include "NameDocumentText.h"
 
 // The keys are a promise to scripts: docs/tool.md lists them, and more may come, but none goes.
@@ -9,16 +9,10 @@
 namespace Ostinet::Tool {
 namespace {
 
-using Json = nlohmann::ordered_json;
-
-constexpr int kChannels = 16;
-constexpr unsigned char kNone = 255;
 // What goes over the wire to a device whose ID nobody knows: the call to all devices.
 constexpr unsigned char kAllDevices = 126;
 constexpr char const* kControlTypes[] = {"7bit", "14bit", "RPN", "NRPN"};
 constexpr char const* kFindingKinds[] = {"malformed", "notStandard", "passedOver"};
-
-Json NumberOrNull(unsigned char number) { return number == kNone ? Json() : Json(number); }
 
 template <class MakeElement>
 Json Array(int count, MakeElement makeElement) {
@@ -143,7 +137,7 @@ std::string NameDocumentJSON(NameDocument const& document) {
              [&](int index) { return document.GetSupportedStandardMode(index).string(); })},
       {"nameSets", Array(document.CountNameSets(),
                          [&](int index) { return NameSetJSON(document.GetNameSet(index)); })}};
-  return json.dump(2, ' ', false, Json::error_handler_t::replace);
+  return JsonText(json);
 }
 
 std::string NameChecksJSON(std::vector<CheckedNameDocument> const& files) {
@@ -157,7 +151,7 @@ std::string NameChecksJSON(std::vector<CheckedNameDocument> const& files) {
             {"valid", file.check.isStandard},
             {"findings", findings}};
   });
-  return json.dump(2, ' ', false, Json::error_handler_t::replace);
+  return JsonText(json);
 }
 
 }  // namespace Ostinet::Tool

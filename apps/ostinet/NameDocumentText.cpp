@@ -1,18 +1,19 @@
 // SPDX-License-Identifier: MIT
 #include "NameDocumentText.h"
 
+#include "StudioText.h"
+
 namespace Ostinet::Tool {
 namespace {
 
-constexpr int kChannels = 16;
-constexpr unsigned char kNone = 255;
+constexpr unsigned char kNoNumber = 255;
 
 std::string BankNumbers(PatchBank const& bank) {
   std::string text;
-  if (bank.GetController0Number() != kNone) {
+  if (bank.GetController0Number() != kNoNumber) {
     text += "  MSB " + std::to_string(bank.GetController0Number());
   }
-  if (bank.GetController32Number() != kNone) {
+  if (bank.GetController32Number() != kNoNumber) {
     text += "  LSB " + std::to_string(bank.GetController32Number());
   }
   return text;
@@ -51,23 +52,6 @@ void AddNameSet(DestinationNameSet const& nameSet, std::vector<std::string>& lin
 }
 
 }  // namespace
-
-std::string ChannelsText(unsigned channels) {
-  std::string text;
-  for (int first = 0; first < kChannels; ++first) {
-    if ((channels >> first & 1U) == 0) {
-      continue;
-    }
-    int last = first;
-    while (last + 1 < kChannels && (channels >> (last + 1) & 1U) != 0) {
-      ++last;
-    }
-    text += (text.empty() ? "" : ", ") + std::to_string(first + 1);
-    text += last > first ? "-" + std::to_string(last + 1) : "";
-    first = last;
-  }
-  return text.empty() ? "none" : text;
-}
 
 std::vector<std::string> NameDocumentLines(NameDocument const& document) {
   std::vector<std::string> lines{"Modes"};

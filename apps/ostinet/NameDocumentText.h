@@ -25,10 +25,10 @@ struct CheckedNameDocument {
 std::vector<std::string> NameCheckLines(CheckedNameDocument const& file);
 std::string NameChecksJSON(std::vector<CheckedNameDocument> const& files);
 
+/// The MIDI channels of a cable.
+inline constexpr int kChannels = 16;
+
 /// Each message as upper-case hexadecimal bytes.
 std::vector<std::string> HexMessages(DataBuffer const& buffer);
-
-/// "1-4, 10" for a mask whose bit 0 is channel 1; "none" for 0.
-std::string ChannelsText(unsigned channels);
 
 }  // namespace Ostinet::Tool

@@ -1,20 +1,11 @@
 // SPDX-License-Identifier: MIT
-#include <nlohmann/json.hpp>
 
+#include "JsonText.h"
 #include "NameLookup.h"
 #include "NameText.h"
 
 namespace Ostinet::Tool {
 namespace {
-
-using Json = nlohmann::ordered_json;
-
-std::string Dump(Json const& json) {
-  return json.dump(2, ' ', false, Json::error_handler_t::replace);
-}
-
-// 255 means none.
-Json NumberOrNull(unsigned char number) { return number != 255 ? Json(number) : Json(); }
 
 Json NameOrNull(Object const& object) {
   return object.GetImplPtr() != nullptr ? Json(object.GetName().string()) : Json();
@@ -56,7 +47,7 @@ std::string BanksWith(std::vector<PatchBank> const& banks, Add const& add) {
     add(bank, json);
     array.push_back(json);
   }
-  return Dump({{"banks", array}});
+  return JsonText({{"banks", array}});
 }
 
 Json NotesOf(NoteNameList const& notes) {
@@ -108,11 +99,11 @@ std::string NamesJSON(Destination const& destination) {
     channels.push_back(NameOrNull(destination.GetCurrentNameSet(channel)));
   }
   Names const names = destination.GetNames();
-  return Dump({{"destination", destination.GetName().string()},
-               {"uniqueID", destination.GetUniqueID()},
-               {"names", names.Exists() ? DocumentJson(names) : Json()},
-               {"mode", NameOrNull(destination.GetCurrentMode())},
-               {"channels", channels}});
+  return JsonText({{"destination", destination.GetName().string()},
+                   {"uniqueID", destination.GetUniqueID()},
+                   {"names", names.Exists() ? DocumentJson(names) : Json()},
+                   {"mode", NameOrNull(destination.GetCurrentMode())},
+                   {"channels", channels}});
 }
 
 std::string CatalogJSON(CatalogView const& view) {
@@ -120,7 +111,7 @@ std::string CatalogJSON(CatalogView const& view) {
   for (Names const& names : view.documents) {
     array.push_back(DocumentJson(names));
   }
-  return Dump({{"documents", array}});
+  return JsonText({{"documents", array}});
 }
 
 std::string ModesJSON(Destination const& destination) {
@@ -136,7 +127,7 @@ std::string ModesJSON(Destination const& destination) {
                      {"selectableWithMIDI", mode.SelectableWithMIDI()},
                      {"channels", channels}});
   }
-  return Dump({{"modes", array}});
+  return JsonText({{"modes", array}});
 }
 
 std::string BanksJSON(std::vector<PatchBank> const& banks) {
@@ -156,16 +147,16 @@ std::string PatchesJSON(std::vector<PatchBank> const& banks) {
 std::string PatchJSON(Patch const& patch) {
   Json json = PatchJson(patch);
   json["bank"] = patch.GetBank().GetName().string();
-  return Dump(json);
+  return JsonText(json);
 }
 
 std::string NoteJSON(int pitch, std::string const& name) {
-  return Dump({{"pitch", pitch}, {"name", name}});
+  return JsonText({{"pitch", pitch}, {"name", name}});
 }
 
 std::string NotesJSON(Patch const& patch) {
   NoteNameList const notes = patch.GetNoteNames();
-  return Dump(
+  return JsonText(
       {{"patch", PatchJson(patch)}, {"notes", NotesOf(notes)}, {"groups", GroupsOf(notes)}});
 }
 
@@ -175,7 +166,7 @@ std::string ControlsJSON(Patch const& patch) {
   for (int i = 0; i < list.CountControls(); ++i) {
     controls.push_back(ControlJson(list.GetControl(i)));
   }
-  return Dump({{"patch", PatchJson(patch)}, {"controls", controls}});
+  return JsonText({{"patch", PatchJson(patch)}, {"controls", controls}});
 }
 
 }  // namespace Ostinet::Tool

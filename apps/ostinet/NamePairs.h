@@ -9,10 +9,10 @@ namespace Ostinet::Tool {
 /// An input and an output of one thing, by their names.
 struct NamePair {
   enum class Kind { kSame, kOpposing, kRelated };
-  Kind kind;
+  Kind kind = Kind::kSame;
   std::string common;  ///< what to call them together
-  size_t source;       ///< places in the lists
-  size_t destination;
+  size_t source = 0;   ///< places in the lists
+  size_t destination = 0;
 };
 
 /// Which belong together. Each is in one pair at most: those of the same name first, then those

@@ -9,16 +9,16 @@ namespace {
 
 using Lines = std::vector<std::string>;
 
-constexpr int kNone = 255;
+constexpr unsigned char kNoNumber = 255;
 
 // "(bank 1/3, program 5)"; what there is none of is left out.
 std::string NumbersText(int msb, int lsb, int program) {
   std::string text;
-  if (msb != kNone || lsb != kNone) {
-    auto const half = [](int number) { return number != kNone ? std::to_string(number) : "-"; };
+  if (msb != kNoNumber || lsb != kNoNumber) {
+    auto const half = [](int number) { return number != kNoNumber ? std::to_string(number) : "-"; };
     text = "bank " + half(msb) + "/" + half(lsb);
   }
-  if (program != kNone) {
+  if (program != kNoNumber) {
     text += (text.empty() ? "program " : ", program ") + std::to_string(program);
   }
   return text.empty() ? "" : "  (" + text + ")";
@@ -42,7 +42,7 @@ char const* TypeText(Names const& names) {
 
 std::string BankText(PatchBank const& bank) {
   return bank.GetName().string() +
-         NumbersText(bank.GetController0Number(), bank.GetController32Number(), kNone);
+         NumbersText(bank.GetController0Number(), bank.GetController32Number(), kNoNumber);
 }
 
 std::string NumberText(double number) {
@@ -106,7 +106,7 @@ Lines PatchesLines(std::vector<PatchBank> const& banks) {
     for (Patch const& patch : PatchesOf(bank)) {
       PatchNumbers const numbers = patch.GetPatchNumbers();
       lines.push_back("  " + patch.GetNumberAndName().string() +
-                      NumbersText(kNone, kNone, numbers.program));
+                      NumbersText(kNoNumber, kNoNumber, numbers.program));
     }
   }
   return lines;

@@ -29,7 +29,7 @@ FileSpecification FileOf(std::string const& path) {
   return file;
 }
 
-void Show(bool asJSON, std::string const& path) {
+void ShowDocument(bool asJSON, std::string const& path) {
   NameDocument const document(FileOf(path));
   if (asJSON) {
     PrintLine(NameDocumentJSON(document));
@@ -69,7 +69,7 @@ void AddNamesShow(CLI::App& names, CommandLine& line) {
       names.add_subcommand("show", "Show what a name document holds for its first maker and model");
   command->add_option("file", *path, "The name document")->type_name("FILE")->required();
   command->callback(
-      [&line, path] { line.run = [&line, path] { Show(line.options.json, *path); }; });
+      [&line, path] { line.run = [&line, path] { ShowDocument(line.options.json, *path); }; });
 }
 
 void AddNamesCheck(CLI::App& names, CommandLine& line) {

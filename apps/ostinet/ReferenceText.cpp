@@ -2,24 +2,23 @@
 #include "ReferenceText.h"
 
 #include <algorithm>
-#include <nlohmann/json.hpp>
 
 #include "Errors.h"
 #include "HexBytes.h"
+#include "JsonText.h"
 
 namespace Ostinet::Tool {
 namespace {
 
-using nlohmann::ordered_json;
 using Outcome = ReferenceResolver::Outcome;
 
-struct TypeWord {
+struct TypeName {
   int type;
   char const* word;
 };
 
 // "bank" and "patch" share a tag.
-constexpr TypeWord kTypeWords[] = {{1, "device"},        {2, "entity"},
+constexpr TypeName kTypeNames[] = {{1, "device"},        {2, "entity"},
                                    {3, "source"},        {4, "destination"},
                                    {5, "mode"},          {6, "name-set"},
                                    {7, "patch"},         {7, "bank"},
@@ -45,22 +44,22 @@ char const* OutcomeText(Outcome outcome) {
 }
 
 template <class T>
-ordered_json OrNull(std::optional<T> const& value) {
-  return value ? ordered_json(*value) : ordered_json(nullptr);
+Json OrNull(std::optional<T> const& value) {
+  return value ? Json(*value) : Json(nullptr);
 }
 
-ordered_json RanksJSON(ObjectMatch const& match) {
-  ordered_json ranks = ordered_json::object();
+Json RanksJSON(ObjectMatch const& match) {
+  Json ranks = Json::object();
   for (int i = 0; i < 5; ++i) {
     auto const criterion = static_cast<ObjectMatch::MatchType>(i);
     ranks[kCriterionKeys[i]] =
-        match.HasValidRank(criterion) ? ordered_json(match.GetRank(criterion)) : nullptr;
+        match.HasValidRank(criterion) ? Json(match.GetRank(criterion)) : nullptr;
   }
   return ranks;
 }
 
-ordered_json CandidateJSON(ReferenceResolver::Candidate const& candidate) {
-  ordered_json levels = ordered_json::array();
+Json CandidateJSON(ReferenceResolver::Candidate const& candidate) {
+  Json levels = Json::array();
   for (MatchLevel const& level : candidate.levels) {
     levels.push_back({{"criterion", kCriterionKeys[level.matchType]},
                       {"minRank", level.minRank},
@@ -75,8 +74,8 @@ ordered_json CandidateJSON(ReferenceResolver::Candidate const& candidate) {
           {"levels", levels}};
 }
 
-ordered_json CandidatesJSON(std::vector<ReferenceResolver::Candidate> const& candidates) {
-  ordered_json list = ordered_json::array();
+Json CandidatesJSON(std::vector<ReferenceResolver::Candidate> const& candidates) {
+  Json list = Json::array();
   for (auto const& candidate : candidates) {
     list.push_back(CandidateJSON(candidate));
   }
@@ -87,11 +86,6 @@ std::string CandidateLine(ReferenceResolver::Candidate const& candidate) {
   return candidate.endpoint.GetName().string() + " (#" +
          std::to_string(candidate.endpoint.GetUniqueID()) + ", weight " +
          std::to_string(candidate.weight) + "): " + candidate.InWords();
-}
-
-// JSON in UTF-8 whatever the names hold.
-std::string Dump(ordered_json const& json) {
-  return json.dump(2, ' ', false, ordered_json::error_handler_t::replace);
 }
 
 }  // namespace
@@ -111,7 +105,7 @@ MatchData ParseReference(std::string const& text) {
 
 MatchObjectID ParseObjectType(std::string const& word) {
   std::string known;
-  for (TypeWord const& entry : kTypeWords) {
+  for (TypeName const& entry : kTypeNames) {
     if (word == entry.word) {
       return MatchObjectID(entry.type);
     }
@@ -121,14 +115,14 @@ MatchObjectID ParseObjectType(std::string const& word) {
 }
 
 std::string ObjectTypeText(MatchObjectID type) {
-  auto const place = std::find_if(std::begin(kTypeWords), std::end(kTypeWords),
-                                  [=](TypeWord const& entry) { return entry.type == type; });
-  return place != std::end(kTypeWords) ? place->word : std::to_string(static_cast<int>(type));
+  auto const place = std::find_if(std::begin(kTypeNames), std::end(kTypeNames),
+                                  [=](TypeName const& entry) { return entry.type == type; });
+  return place != std::end(kTypeNames) ? place->word : std::to_string(static_cast<int>(type));
 }
 
 std::string ReferenceJSON(MatchData const& data) {
   MatchContents const contents = data.GetContents();
-  ordered_json json = {{"reference", ReferenceText(data)}, {"valid", contents.isValid}};
+  Json json = {{"reference", ReferenceText(data)}, {"valid", contents.isValid}};
   if (contents.isValid) {
     json["implementation"] = static_cast<int>(contents.implementation);
     json["type"] = ObjectTypeText(contents.objectType);
@@ -142,7 +136,7 @@ std::string ReferenceJSON(MatchData const& data) {
     json["generalMIDI"] = OrNull(contents.supportsGeneralMIDI);
     json["internalSoftware"] = OrNull(contents.isInternalSoftware);
   }
-  return Dump(json);
+  return JsonText(json);
 }
 
 std::vector<std::string> AnswerLines(ReferenceResolver::Answer const& answer) {
@@ -157,22 +151,22 @@ std::vector<std::string> AnswerLines(ReferenceResolver::Answer const& answer) {
 }
 
 std::string AnswerJSON(ReferenceResolver::Answer const& answer) {
-  return Dump({{"outcome", OutcomeText(answer.outcome)},
-               {"text", answer.InWords()},
-               {"best", CandidatesJSON(answer.best)},
-               {"runnersUp", CandidatesJSON(answer.runnersUp)}});
+  return JsonText({{"outcome", OutcomeText(answer.outcome)},
+                   {"text", answer.InWords()},
+                   {"best", CandidatesJSON(answer.best)},
+                   {"runnersUp", CandidatesJSON(answer.runnersUp)}});
 }
 
 std::string PairsJSON(std::vector<NamePair> const& pairs, std::vector<std::string> const& sources,
                       std::vector<std::string> const& destinations) {
-  ordered_json list = ordered_json::array();
+  Json list = Json::array();
   for (NamePair const& pair : pairs) {
     list.push_back({{"name", pair.common},
                     {"source", sources[pair.source]},
                     {"destination", destinations[pair.destination]},
                     {"kind", KindText(pair.kind)}});
   }
-  return Dump({{"pairs", list}});
+  return JsonText({{"pairs", list}});
 }
 
 }  // namespace Ostinet::Tool

@@ -3,8 +3,8 @@
 
 #include <algorithm>
 #include <map>
-#include <nlohmann/json.hpp>
 
+#include "JsonText.h"
 #include "StudioText.h"
 
 namespace Ostinet::Tool {
@@ -152,10 +152,10 @@ std::string ChangeText(Change const& change) {
 }
 
 std::string ChangeJSON(Change const& change) {
-  nlohmann::ordered_json json = {{"event", change.event},
-                                 {"kind", change.kind},
-                                 {"name", change.name},
-                                 {"uniqueID", change.uniqueID}};
+  Json json = {{"event", change.event},
+               {"kind", change.kind},
+               {"name", change.name},
+               {"uniqueID", change.uniqueID}};
   if (change.was) {
     json["was"] = *change.was;
   }
@@ -169,7 +169,7 @@ std::string ChangeJSON(Change const& change) {
   if (change.mask) {
     json["channels"] = *change.mask;
   }
-  return json.dump(-1, ' ', false, nlohmann::ordered_json::error_handler_t::replace);
+  return JsonLine(json);
 }
 
 }  // namespace Ostinet::Tool

@@ -2,8 +2,8 @@
 #include "StudioEditing.h"
 
 #include <CLI/CLI.hpp>
-#include <nlohmann/json.hpp>
 
+#include "JsonText.h"
 #include "Output.h"
 
 namespace Ostinet::Tool {
@@ -14,8 +14,8 @@ NamedObject Named(DeviceObject const& object) {
 
 void PrintNamed(GlobalOptions const& globals, NamedObject const& object) {
   if (globals.json) {
-    nlohmann::ordered_json const json = {{"name", object.name}, {"uniqueID", object.uniqueID}};
-    PrintLine(json.dump(-1, ' ', false, nlohmann::ordered_json::error_handler_t::replace));
+    Json const json = {{"name", object.name}, {"uniqueID", object.uniqueID}};
+    PrintLine(JsonLine(json));
   } else {
     PrintLine(object.name + "  #" + std::to_string(object.uniqueID));
   }

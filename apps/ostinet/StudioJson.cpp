@@ -1,14 +1,12 @@
 // SPDX-License-Identifier: MIT
-#include <nlohmann/json.hpp>
 
+#include "JsonText.h"
 #include "StudioText.h"
 
 // The keys are a promise to scripts: docs/tool.md lists them, and more may come, but none goes.
 
 namespace Ostinet::Tool {
 namespace {
-
-using Json = nlohmann::ordered_json;
 
 template <class View, class ToJson>
 Json Array(std::vector<View> const& views, ToJson toJson) {
@@ -63,7 +61,7 @@ std::string StudioJSON(StudioView const& view) {
   Json const studio = {{"devices", Array(view.devices, DeviceJson)},
                        {"sources", Array(view.sources, EndpointJson)},
                        {"destinations", Array(view.destinations, EndpointJson)}};
-  return studio.dump(2, ' ', false, Json::error_handler_t::replace);
+  return JsonText(studio);
 }
 
 }  // namespace Ostinet::Tool

@@ -1,12 +1,10 @@
 // SPDX-License-Identifier: MIT
 #include "TypesText.h"
 
-#include <nlohmann/json.hpp>
+#include "JsonText.h"
 
 namespace Ostinet::Tool {
 namespace {
-
-using Json = nlohmann::ordered_json;
 
 std::string Counted(size_t count, std::string const& thing) {
   return std::to_string(count) + " " + thing + (count == 1 ? "" : "s");
@@ -77,11 +75,6 @@ Json DeviceIDJson(DeviceTypeFacts const& facts) {
 
 Json TextOrNull(std::string const& text) { return text.empty() ? Json() : Json(text); }
 
-// Names may hold what is no whole character.
-std::string Dump(Json const& json) {
-  return json.dump(-1, ' ', false, Json::error_handler_t::replace);
-}
-
 }  // namespace
 
 std::vector<std::string> MakerLines(MakerCounts const& makers) {
@@ -97,7 +90,7 @@ std::string MakersJSON(MakerCounts const& makers) {
   for (auto const& [name, count] : makers) {
     array.push_back({{"manufacturer", name}, {"models", count}});
   }
-  return Dump({{"manufacturers", array}});
+  return JsonLine({{"manufacturers", array}});
 }
 
 std::vector<std::string> ModelLines(std::vector<DeviceTypeInfo> const& types) {
@@ -109,7 +102,7 @@ std::vector<std::string> ModelLines(std::vector<DeviceTypeInfo> const& types) {
 }
 
 std::string ModelsJSON(std::string const& maker, std::vector<DeviceTypeInfo> const& types) {
-  return Dump({{"manufacturer", maker}, {"models", ModelLines(types)}});
+  return JsonLine({{"manufacturer", maker}, {"models", ModelLines(types)}});
 }
 
 std::vector<std::string> TypeLines(DeviceTypeInfo const& type) {
@@ -144,15 +137,15 @@ std::string TypeJSON(DeviceTypeInfo const& type) {
   for (auto const& [name, value] : facts.flags) {
     flags[name.string()] = value;
   }
-  return Dump({{"manufacturer", type.GetMfrName().string()},
-               {"model", type.GetModelName().string()},
-               {"identity", TextOrNull(IdentityText(facts.inquiryResponse))},
-               {"deviceID", DeviceIDJson(facts)},
-               {"receiveMaxChannels", facts.receiveMaxChannels},
-               {"transmitMaxChannels", facts.transmitMaxChannels},
-               {"flags", flags},
-               {"image", TextOrNull(facts.image.string())},
-               {"ports", PortsJson(facts)}});
+  return JsonLine({{"manufacturer", type.GetMfrName().string()},
+                   {"model", type.GetModelName().string()},
+                   {"identity", TextOrNull(IdentityText(facts.inquiryResponse))},
+                   {"deviceID", DeviceIDJson(facts)},
+                   {"receiveMaxChannels", facts.receiveMaxChannels},
+                   {"transmitMaxChannels", facts.transmitMaxChannels},
+                   {"flags", flags},
+                   {"image", TextOrNull(facts.image.string())},
+                   {"ports", PortsJson(facts)}});
 }
 
 std::vector<std::string> CheckLines(CheckedFile const& file) {
@@ -184,7 +177,7 @@ std::string ChecksJSON(std::vector<CheckedFile> const& files) {
                      {"types", types},
                      {"notes", notes}});
   }
-  return Dump({{"files", array}});
+  return JsonLine({{"files", array}});
 }
 
 }  // namespace Ostinet::Tool

@@ -1,10 +1,10 @@
 // SPDX-License-Identifier: MIT
 #include "VirtualEndpoints.h"
 
-#include <nlohmann/json.hpp>
 #include <utility>
 
 #include "Errors.h"
+#include "JsonText.h"
 #include "Lookup.h"
 #include "ReferenceText.h"
 
@@ -17,8 +17,6 @@
 
 namespace Ostinet::Tool {
 namespace {
-
-using Json = nlohmann::ordered_json;
 
 char const* WordOf(Setup::SrcOrDest end) {
   return end == Setup::kSourceEnd ? "source" : "destination";
@@ -79,7 +77,7 @@ void VirtualEndpoints::Save(File const& file) const {
                     {"reference", ReferenceText(pair.kept.reference)}});
   }
   Json const content = {{"virtual", list}};
-  std::string const text = content.dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
+  std::string const text = JsonText(content) + "\n";
   try {
     file.Replace(text.data(), text.size());
   } catch (std::exception const& error) {

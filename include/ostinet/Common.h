@@ -115,7 +115,7 @@ RCPtrMT<T>::~RCPtrMT() {
 
 template <class T>
 RCPtrMT<T>& RCPtrMT<T>::operator=(RCPtrMT const& other) {
-  return *this = other.pointer_;
+  return this == &other ? *this : *this = other.pointer_;
 }
 
 template <class T>

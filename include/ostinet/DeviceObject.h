@@ -75,7 +75,7 @@ class OSTINET_EXPORT DeviceObject : public Object {
 
   /// True while the object is in the studio. It never turns true again: a device that comes back
   /// is a new object.
-  virtual bool Exists() const;
+  bool Exists() const override;
   /// True for what the platform has (a port), false for what the user described (an instrument).
   bool IsDirect() const;
   /// True if MIDI can flow: a port is there; a user's device hangs on a port that is there.

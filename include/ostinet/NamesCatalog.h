@@ -257,8 +257,8 @@ struct OSTINET_EXPORT NoteGroup {
 /// Errors       None are thrown.
 class OSTINET_EXPORT NoteNameListBase : public Object {
  public:
-  virtual UString GetName() const;
-  virtual ~NoteNameListBase();
+  UString GetName() const override;
+  ~NoteNameListBase() override;
   /// True if there is a list, with or without notes in it.
   virtual bool HasNames() const;
   virtual int CountNoteNames() const;
@@ -400,8 +400,8 @@ class OSTINET_EXPORT Control {
 /// Errors       None are thrown.
 class OSTINET_EXPORT ControlListBase : public Object {
  public:
-  virtual UString GetName() const;
-  virtual ~ControlListBase();
+  UString GetName() const override;
+  ~ControlListBase() override;
   virtual int CountControls() const;
   /// A default-constructed Control where there is none.
   virtual Control GetControl(ControlType type, unsigned short number) const;

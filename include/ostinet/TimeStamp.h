@@ -99,8 +99,8 @@ class OSTINET_EXPORT DataBuffer {
  private:
   struct Entry {
     TimeStamp stamp;
-    size_t offset;
-    size_t length;
+    size_t offset = 0;
+    size_t length = 0;
   };
 
   std::vector<Entry> entries_;

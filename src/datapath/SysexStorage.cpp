@@ -15,22 +15,22 @@ struct MakerHolder {
 };
 
 // Never destroyed: a host's own statics may hold references until the process ends.
-MakerHolder& Holder() {
+MakerHolder& Makers() {
   static MakerHolder& holder = *new MakerHolder;
   return holder;
 }
 
 std::shared_ptr<SysexStorageMaker> CurrentMaker() {
-  std::lock_guard const lock(Holder().mutex);
-  return Holder().maker;
+  std::lock_guard const lock(Makers().mutex);
+  return Makers().maker;
 }
 
 }  // namespace
 
 void SetSysexStorageMaker(std::shared_ptr<SysexStorageMaker> maker) {
   {
-    std::lock_guard const lock(Holder().mutex);
-    Holder().maker.swap(maker);
+    std::lock_guard const lock(Makers().mutex);
+    Makers().maker.swap(maker);
   }
   // The old maker, with the session that it may hold, ends here, outside the lock.
 }

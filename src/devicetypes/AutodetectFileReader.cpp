@@ -7,7 +7,7 @@ namespace Ostinet::Impl {
 
 namespace {
 
-namespace Names {
+namespace RequestWords {
 
 XMLLib::Name const kRoot("MIDIAutoDetect");
 XMLLib::Name const kRequest("Request");
@@ -21,15 +21,14 @@ XMLLib::Name const kDeviceID("DeviceID");
 XMLLib::Name const kOffset("Offset");
 XMLLib::Name const kAny("Any");
 
-}  // namespace Names
+}  // namespace RequestWords
 
 constexpr unsigned char kEndOfExclusive = 0xF7;
-constexpr unsigned char kAnyByte = 0xF8;
 constexpr unsigned char kLastSlot = 0xFF;
 constexpr unsigned kHighestOffset = 255;
 
 // The value of a hexadecimal digit, or -1.
-int DigitValue(char16_t unit) {
+int DigitOrNone(char16_t unit) {
   if (unit >= u'0' && unit <= u'9') return unit - u'0';
   if (unit >= u'A' && unit <= u'F') return unit - u'A' + 10;
   if (unit >= u'a' && unit <= u'f') return unit - u'a' + 10;
@@ -45,7 +44,7 @@ void AddBytes(UString const& text, std::vector<MatchEntry>& table) {
     if (XMLLib::Parser::IsWhitespace(unit)) {
       continue;
     }
-    int const digit = DigitValue(unit);
+    int const digit = DigitOrNone(unit);
     last = digit < 0 ? last : digit;
     if (high < 0) {
       high = last;
@@ -66,10 +65,10 @@ void LoosenEnd(std::vector<MatchEntry>& table) {
 }  // namespace
 
 void AutodetectFileReader::ReadRequests(AutodetectRequests& requests) {
-  if (!parser_.DownToReqChildNounexp(Names::kRoot)) {
+  if (!parser_.DownToReqChildNounexp(RequestWords::kRoot)) {
     return;
   }
-  for (; parser_.DownToChildNounexp(Names::kRequest); parser_.UpToParent()) {
+  for (; parser_.DownToChildNounexp(RequestWords::kRequest); parser_.UpToParent()) {
     requests.push_back(ReadRequest());
   }
 }
@@ -78,12 +77,12 @@ void AutodetectFileReader::ReadRequests(AutodetectRequests& requests) {
 // request without a message has none.
 RCPtrMT<AutodetectRequestImpl> AutodetectFileReader::ReadRequest() {
   RCPtrMT<AutodetectRequestImpl> const request = new AutodetectRequestImpl;
-  if (parser_.DownToReqChildNounexp(Names::kRequestMIDI)) {
+  if (parser_.DownToReqChildNounexp(RequestWords::kRequestMIDI)) {
     request->messages.push_back(ReadTemplate(Template::kRequest));
     parser_.UpToParent();
   }
   bool found = false;
-  for (; parser_.DownToReqChildrenNounexp(Names::kResponse, found); parser_.UpToParent()) {
+  for (; parser_.DownToReqChildrenNounexp(RequestWords::kResponse, found); parser_.UpToParent()) {
     request->responses.push_back(ReadResponse());
   }
   return request;
@@ -91,14 +90,14 @@ RCPtrMT<AutodetectRequestImpl> AutodetectFileReader::ReadRequest() {
 
 RCPtrMT<AutodetectResponseImpl> AutodetectFileReader::ReadResponse() {
   RCPtrMT<AutodetectResponseImpl> const response = new AutodetectResponseImpl;
-  if (parser_.DownToReqChildNounexp(Names::kResponseMIDI)) {
+  if (parser_.DownToReqChildNounexp(RequestWords::kResponseMIDI)) {
     response->table = ReadTemplate(Template::kResponse);
     parser_.UpToParent();
   }
   for (; parser_.DownToChild(); parser_.UpToParent()) {
-    if (parser_.CurrentElement() == Names::kDevice) {
+    if (parser_.CurrentElement() == RequestWords::kDevice) {
       response->deviceTypes.push_back(ReadDevice());
-    } else if (parser_.CurrentElement() == Names::kRequest) {
+    } else if (parser_.CurrentElement() == RequestWords::kRequest) {
       response->requests.push_back(ReadRequest());
     }
   }
@@ -113,10 +112,11 @@ std::vector<MatchEntry> AutodetectFileReader::ReadTemplate(Template which) {
     if (!parser_.DownToChild()) {
       return table;
     }
-    if (parser_.CurrentElement() == Names::kDeviceID) {
-      unsigned const offset = ReadDecimal(parser_, Names::kOffset, kHighestOffset).value_or(0);
+    if (parser_.CurrentElement() == RequestWords::kDeviceID) {
+      unsigned const offset =
+          ReadDecimal(parser_, RequestWords::kOffset, kHighestOffset).value_or(0);
       table.push_back({1, static_cast<unsigned char>(offset)});
-    } else if (which == Template::kResponse && parser_.CurrentElement() == Names::kAny) {
+    } else if (which == Template::kResponse && parser_.CurrentElement() == RequestWords::kAny) {
       table.push_back({0, kLastSlot});
     }
   }
@@ -126,8 +126,8 @@ std::vector<MatchEntry> AutodetectFileReader::ReadTemplate(Template which) {
 RCPtrMT<DeviceTypeInfoImpl> AutodetectFileReader::ReadDevice() {
   UString manufacturer;
   UString model;
-  if (parser_.ReadReqAttribute(Names::kManufacturer, manufacturer) &&
-      parser_.ReadReqAttribute(Names::kModel, model)) {
+  if (parser_.ReadReqAttribute(RequestWords::kManufacturer, manufacturer) &&
+      parser_.ReadReqAttribute(RequestWords::kModel, model)) {
     for (auto const& type : types_) {
       if (type->manufacturer.equal(manufacturer, UString::kCatalogKey) &&
           type->model.equal(model, UString::kCatalogKey)) {

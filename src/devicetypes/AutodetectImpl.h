@@ -10,6 +10,10 @@
 
 namespace Ostinet::Impl {
 
+/// The first value of an answer's table that is no byte: it takes any byte and forgets it. Those
+/// above it, up to 0xFF, keep it in one of the seven slots of the identity.
+inline constexpr unsigned char kAnyByte = 0xF8;
+
 /// How one answer to a request looks, and what it tells. Read-only once the catalog is built.
 class AutodetectResponseImpl : public RCObjectMT<AutodetectResponseImpl> {
  public:

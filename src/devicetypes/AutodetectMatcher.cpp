@@ -1,14 +1,15 @@
 // SPDX-License-Identifier: MIT
 #include <utility>
 
-#include "ostinet/Autodetect.h"
+#include "devicetypes/AutodetectImpl.h"
 
 namespace Ostinet {
 
 namespace {
 
-constexpr unsigned char kAnyByte = 0xF8;    // and all values above it
-constexpr unsigned char kFirstSlot = 0xF9;  // up to 0xFF: the seven slots
+using Impl::kAnyByte;
+
+constexpr unsigned char kFirstSlot = kAnyByte + 1;
 
 }  // namespace
 

@@ -8,8 +8,6 @@ namespace Ostinet::Impl {
 namespace {
 
 constexpr std::size_t kMostResponses = 10;
-constexpr unsigned char kAnyByte = 0xF8;
-
 using Responses = std::vector<RCPtrMT<AutodetectResponseImpl>>;
 
 // Two bytes of a reply, neither of them the device ID or one that may be anything.

@@ -12,7 +12,7 @@ namespace Ostinet::Impl {
 
 namespace {
 
-namespace Names {
+namespace TypeWords {
 XMLLib::Name const kRoot("MIDIDeviceTypes");
 XMLLib::Name const kAuthor("Author");
 XMLLib::Name const kType("MIDIDeviceType");
@@ -35,7 +35,7 @@ XMLLib::Name const kMax("Max");
 XMLLib::Name const kBase("Base");
 XMLLib::Name const kName("Name");
 XMLLib::Name const kMaxChannels("MaxChannels");
-}  // namespace Names
+}  // namespace TypeWords
 
 constexpr unsigned kHighestDeviceNumber = 255;
 constexpr unsigned kChannels = 16;
@@ -80,15 +80,15 @@ void DevTypeFileReader::Read() {
 }
 
 void DevTypeFileReader::Read(XMLLib::Parser& parser) {
-  if (!parser.DownToReqChildNounexp(Names::kRoot)) {
-    Note(parser, "the root element is not " + Quoted(Names::kRoot) + ": nothing is read");
+  if (!parser.DownToReqChildNounexp(TypeWords::kRoot)) {
+    Note(parser, "the root element is not " + Quoted(TypeWords::kRoot) + ": nothing is read");
     return;
   }
   NoteAttributes(parser, {});
   for (; parser.DownToChild(); parser.UpToParent()) {
-    if (parser.CurrentElement() == Names::kType) {
+    if (parser.CurrentElement() == TypeWords::kType) {
       ReadType(parser);
-    } else if (parser.CurrentElement() == Names::kAuthor) {
+    } else if (parser.CurrentElement() == TypeWords::kAuthor) {
       NoteAttributes(parser, {});
       author_ = parser.ReadText();
     } else {
@@ -100,21 +100,22 @@ void DevTypeFileReader::Read(XMLLib::Parser& parser) {
 void DevTypeFileReader::ReadType(XMLLib::Parser& parser) {
   UString manufacturer;
   UString model;
-  bool const hasManufacturer = parser.ReadReqAttribute(Names::kManufacturer, manufacturer);
-  bool const hasModel = parser.ReadReqAttribute(Names::kModel, model);
+  bool const hasManufacturer = parser.ReadReqAttribute(TypeWords::kManufacturer, manufacturer);
+  bool const hasModel = parser.ReadReqAttribute(TypeWords::kModel, model);
   if (!hasManufacturer || !hasModel) {
     Note(parser, "a type without " +
-                     Quoted(hasManufacturer ? Names::kModel : Names::kManufacturer) +
+                     Quoted(hasManufacturer ? TypeWords::kModel : TypeWords::kManufacturer) +
                      " is skipped with all that is in it");
     return;
   }
   int const line = parser.CurrentLine();
   RCPtrMT<Type> const type(new Type(std::move(manufacturer), std::move(model)));
-  parser.ReadAttribute(Names::kImage, type->image);
+  parser.ReadAttribute(TypeWords::kImage, type->image);
   for (std::size_t i = 0; i < type->capabilities.size(); ++i) {
     ReadFlag(parser, kCapabilityFlags[i], type->capabilities[i]);
   }
-  NoteAttributes(parser, {&Names::kManufacturer, &Names::kModel, &Names::kImage}, kCapabilityFlags);
+  NoteAttributes(parser, {&TypeWords::kManufacturer, &TypeWords::kModel, &TypeWords::kImage},
+                 kCapabilityFlags);
   for (; parser.DownToChild(); parser.UpToParent()) {
     ReadTypeChild(parser, *type);
   }
@@ -124,15 +125,15 @@ void DevTypeFileReader::ReadType(XMLLib::Parser& parser) {
 
 void DevTypeFileReader::ReadTypeChild(XMLLib::Parser& parser, Type& type) {
   XMLLib::Name const& element = parser.CurrentElement();
-  if (element == Names::kPortGroup) {
+  if (element == TypeWords::kPortGroup) {
     ReadPortGroup(parser, type);
-  } else if (element == Names::kReceives) {
+  } else if (element == TypeWords::kReceives) {
     ReadTraffic(parser, kReceiveFlags, type.receives);
-  } else if (element == Names::kTransmits) {
+  } else if (element == TypeWords::kTransmits) {
     ReadTraffic(parser, kTransmitFlags, type.transmits);
-  } else if (element == Names::kInquiryResponse) {
+  } else if (element == TypeWords::kInquiryResponse) {
     ReadInquiryResponse(parser, type);
-  } else if (element == Names::kDeviceID) {
+  } else if (element == TypeWords::kDeviceID) {
     ReadDeviceID(parser, type);
   } else {
     NoteElement(parser, "MIDIDeviceType");
@@ -141,20 +142,20 @@ void DevTypeFileReader::ReadTypeChild(XMLLib::Parser& parser, Type& type) {
 
 // All three or none, and the first that is whole counts.
 void DevTypeFileReader::ReadInquiryResponse(XMLLib::Parser const& parser, Type& type) {
-  NoteAttributes(parser, {&Names::kManufacturer, &Names::kFamily, &Names::kMember});
+  NoteAttributes(parser, {&TypeWords::kManufacturer, &TypeWords::kFamily, &TypeWords::kMember});
   if (!(type.inquiryResponse == ModelInfo())) {
     Note(parser, "the type has an \"InquiryResponse\" already: this one is skipped");
     return;
   }
   ModelInfo info;
-  if (!SetManufacturer(ReadHexBytes(parser, Names::kManufacturer), info)) {
+  if (!SetManufacturer(ReadHexBytes(parser, TypeWords::kManufacturer), info)) {
     Note(parser,
          "\"Manufacturer\" is not one byte or three, of two digits 0-9 and A-F up to 7F: the "
          "\"InquiryResponse\" is skipped");
     return;
   }
   unsigned char* out = info.bytes + 3;
-  for (XMLLib::Name const* name : {&Names::kFamily, &Names::kMember}) {
+  for (XMLLib::Name const* name : {&TypeWords::kFamily, &TypeWords::kMember}) {
     if (!SetPair(ReadHexBytes(parser, *name), out)) {
       Note(parser, Quoted(*name) +
                        " is not two bytes, of two digits 0-9 and A-F up to 7F: the "
@@ -167,12 +168,14 @@ void DevTypeFileReader::ReadInquiryResponse(XMLLib::Parser const& parser, Type& 
 }
 
 void DevTypeFileReader::ReadDeviceID(XMLLib::Parser const& parser, Type& type) {
-  NoteAttributes(parser, {&Names::kDefault, &Names::kMin, &Names::kMax, &Names::kBase});
+  NoteAttributes(parser,
+                 {&TypeWords::kDefault, &TypeWords::kMin, &TypeWords::kMax, &TypeWords::kBase});
   if (type.hasDeviceID) {
     Note(parser, "the type has a \"DeviceID\" already: this one is skipped");
     return;
   }
-  XMLLib::Name const* const names[] = {&Names::kDefault, &Names::kMin, &Names::kMax, &Names::kBase};
+  XMLLib::Name const* const names[] = {&TypeWords::kDefault, &TypeWords::kMin, &TypeWords::kMax,
+                                       &TypeWords::kBase};
   unsigned numbers[4] = {};
   for (std::size_t i = 0; i < 4; ++i) {
     auto const number = ReadDecimal(parser, *names[i], kHighestDeviceNumber);
@@ -191,18 +194,18 @@ void DevTypeFileReader::ReadDeviceID(XMLLib::Parser const& parser, Type& type) {
 // A name that is absent leaves the text empty, and its port is called as its entity calls it.
 void DevTypeFileReader::ReadPortGroup(XMLLib::Parser& parser, Type& type) {
   DeviceTypePortGroup group;
-  NoteAttributes(parser, {&Names::kName});
+  NoteAttributes(parser, {&TypeWords::kName});
   UString text;
-  parser.ReadAttribute(Names::kName, text);
+  parser.ReadAttribute(TypeWords::kName, text);
   group.name = text;
   for (; parser.DownToChild(); parser.UpToParent()) {
-    bool const isIn = parser.CurrentElement() == Names::kIn;
-    if (!isIn && parser.CurrentElement() != Names::kOut) {
+    bool const isIn = parser.CurrentElement() == TypeWords::kIn;
+    if (!isIn && parser.CurrentElement() != TypeWords::kOut) {
       NoteElement(parser, "MIDIPortGroup");
       continue;
     }
-    NoteAttributes(parser, {&Names::kName});
-    parser.ReadAttribute(Names::kName, text);
+    NoteAttributes(parser, {&TypeWords::kName});
+    parser.ReadAttribute(TypeWords::kName, text);
     (isIn ? group.ins : group.outs).push_back(text);
   }
   type.portGroups.push_back(std::move(group));
@@ -225,9 +228,9 @@ void DevTypeFileReader::ReadFlag(XMLLib::Parser const& parser, DeviceTypeFlag co
 template <std::size_t N>
 void DevTypeFileReader::ReadTraffic(XMLLib::Parser const& parser, DeviceTypeFlag const (&flags)[N],
                                     DeviceTypeTraffic<N>& traffic) {
-  NoteAttributes(parser, {&Names::kMaxChannels}, flags);
+  NoteAttributes(parser, {&TypeWords::kMaxChannels}, flags);
   UString text;
-  if (parser.ReadAttribute(Names::kMaxChannels, text)) {
+  if (parser.ReadAttribute(TypeWords::kMaxChannels, text)) {
     if (auto const channels = ParseDecimal(text, kChannels)) {
       traffic.maxChannels = static_cast<std::uint16_t>(*channels);
     } else {

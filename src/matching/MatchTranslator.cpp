@@ -33,12 +33,12 @@ namespace {
 enum Kind : short {
   kNothing = -1,
   kExternalDevice = 0,  // known by its codes
-  kSoftware = 2,
+  kSoftwareKind = 2,
   kDirectPort = 3,
   kOtherSoftware = 4,
 };
 
-bool IsSoftwareKind(short kind) { return kind == kSoftware || kind == kOtherSoftware; }
+bool IsSoftwareKind(short kind) { return kind == kSoftwareKind || kind == kOtherSoftware; }
 
 void WriteFieldsOfKind(MatchDataWriter::Stream& stream, BreviaDestinationMatch const& record) {
   auto const& fields = record.fields;
@@ -112,7 +112,7 @@ bool ReadDescription(MatchDataReader const& reader, Description& out) {
 
 short KindOf(Description const& description) {
   if (description.isSoftware) {
-    return kSoftware;
+    return kSoftwareKind;
   }
   return description.isDirect ? kDirectPort : kExternalDevice;
 }

@@ -12,7 +12,7 @@ namespace {
 UString const kMaster("master");
 UString const kBanks("banks");
 UString const kFile("file");
-UString const kPatchNameList("patchNameList");
+UString const kPatchListKey("patchNameList");
 
 FileModDate DateOf(FileSpecification const& file) {
   try {
@@ -66,7 +66,7 @@ NameConfiguration NameConfiguration::Read(ImplImpl const& peer) {
       FileSpecification const file =
           entry != nullptr ? FindFile(*entry, kFile) : FileSpecification();
       if (file.IsValid()) {
-        UString const* const patchList = Find<UString>(*entry, kPatchNameList);
+        UString const* const patchList = Find<UString>(*entry, kPatchListKey);
         result.SetOverride(bankName, file, patchList != nullptr ? *patchList : UString());
       }
     }
@@ -87,7 +87,7 @@ void NameConfiguration::Store(ImplImpl& peer) const {
     for (auto const& [bankName, entry] : overrides) {
       PropertyDict bank;
       bank.entries[kFile] = PropertyPath{entry.file.GetFullPath()};
-      bank.entries[kPatchNameList] = entry.patchList;
+      bank.entries[kPatchListKey] = entry.patchList;
       banks.entries[bankName] = bank;
     }
     dict.entries[kBanks] = banks;

@@ -3,6 +3,7 @@
 
 #include <algorithm>
 
+#include "names/DocumentNames.h"
 #include "ostinet/core/XML.h"
 
 namespace Ostinet::Impl {
@@ -11,16 +12,7 @@ namespace {
 
 using XMLLib::Name;
 using XMLLib::Parser;
-
-Name const kDocument("MIDINameDocument");
-Name const kAuthor("Author");
-Name const kMasterDeviceNames("MasterDeviceNames");
-Name const kExtendingDeviceNames("ExtendingDeviceNames");
-Name const kStandardDeviceMode("StandardDeviceMode");
-Name const kManufacturer("Manufacturer");
-Name const kModel("Model");
-Name const kPatchNameList("PatchNameList");
-Name const kName("Name");
+using namespace DocumentNames;
 
 // `patchLists` is null where such lists do not count.
 void ReadDeviceNames(Parser& parser, NameDocumentDigest::Master& entry,

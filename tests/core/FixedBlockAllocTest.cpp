@@ -82,9 +82,9 @@ TEST(FixedBlockAlloc, WorksWithTheSmallestSizes) {
 
 TEST(FixedBlockAllocThreads, GiveEachBlockToOneThreadAtATime) {
   FixedBlockAllocMT pool(sizeof(int), 2);
-  constexpr int kThreads = 4;
-  std::vector<int> wrong(kThreads, 0);
-  Testing::RunTogether(kThreads, [&](int thread) {
+  constexpr int kUsers = 4;
+  std::vector<int> wrong(kUsers, 0);
+  Testing::RunTogether(kUsers, [&](int thread) {
     for (int round = 0; round < 10000; ++round) {
       int* held[3];
       for (int*& block : held) {
@@ -97,7 +97,7 @@ TEST(FixedBlockAllocThreads, GiveEachBlockToOneThreadAtATime) {
       }
     }
   });
-  EXPECT_EQ(wrong, std::vector<int>(kThreads, 0));
+  EXPECT_EQ(wrong, std::vector<int>(kUsers, 0));
   EXPECT_LE(pool.CountBlocks(), 16U);  // 4 threads with 3 blocks, in chunks that double
 }
 

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "datapath/SysexStorage.h"
+#include "ostinet/SysexRef.h"
 #include "ostinet/core/Error.h"
 
 namespace Ostinet::Testing {
@@ -65,5 +66,8 @@ class SysexSession {
  private:
   std::shared_ptr<StorageRecord> record_ = std::make_shared<StorageRecord>();
 };
+
+using Bytes = std::vector<unsigned char>;
+inline Bytes BytesOf(SysexRefBase const& ref) { return Bytes(ref.begin(), ref.end()); }
 
 }  // namespace Ostinet::Testing

@@ -11,10 +11,9 @@
 namespace Ostinet {
 namespace {
 
-using Bytes = std::vector<unsigned char>;
+using Testing::Bytes;
+using Testing::BytesOf;
 using Sizes = std::vector<std::size_t>;
-
-Bytes BytesOf(SysexRefBase const& ref) { return Bytes(ref.begin(), ref.end()); }
 
 class SysexEditRefTest : public testing::Test {
  protected:

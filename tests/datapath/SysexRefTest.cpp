@@ -11,11 +11,10 @@
 namespace Ostinet {
 namespace {
 
-using Bytes = std::vector<unsigned char>;
+using Testing::Bytes;
+using Testing::BytesOf;
 
 Bytes const kMessage{0xF0, 0x7E, 0x7F, 6, 1, 0xF7};
-
-Bytes BytesOf(SysexRefBase const& ref) { return Bytes(ref.begin(), ref.end()); }
 
 SysexRef MakeMessage() { return SysexRef(kMessage.data(), kMessage.size()); }
 

@@ -13,7 +13,7 @@ using ::testing::ElementsAre;
 using ::testing::IsEmpty;
 using Kind = SimulatedPort::Kind;
 
-Bytes Sysex(std::size_t size) {
+Bytes CountingSysex(std::size_t size) {
   Bytes bytes(size);
   for (std::size_t i = 0; i < size; ++i) {
     bytes[i] = static_cast<unsigned char>(i & 0x7F);
@@ -88,7 +88,7 @@ TEST_F(LegacyInput, ADirectReceiverGetsWhatTheFilterLetThrough) {
 }
 
 TEST_F(LegacyInput, ALongSysexArrivesInBufferfuls) {
-  Bytes const sysex = Sysex(600);
+  Bytes const sysex = CountingSysex(600);
   Arrive(sysex);
   setup.ProcessInput();
   ASSERT_EQ(receiver.packets.size(), 3u);
@@ -103,7 +103,7 @@ TEST_F(LegacyInput, ALongSysexArrivesInBufferfuls) {
 
 TEST_F(LegacyInput, GivesItsBuffersBackForEver) {
   for (int i = 0; i < 200; ++i) {  // many times what 32 buffers take
-    Arrive(Sysex(250));
+    Arrive(CountingSysex(250));
   }
   setup.ProcessInput();
   EXPECT_EQ(receiver.packets.size(), 200u);
@@ -185,7 +185,7 @@ TEST_F(LegacyInput, ABufferThatCannotBePreparedIsLeftOut) {
   midi.Fail("midiInPrepareHeader", 3);
   SignIn();
   EXPECT_EQ(midi.CountCalls("midiInAddBuffer"), 31u);
-  Arrive(Sysex(100));
+  Arrive(CountingSysex(100));
   setup.ProcessInput();
   EXPECT_EQ(receiver.packets.size(), 1u);
 }
@@ -302,7 +302,7 @@ TEST_F(VirtualPair, ADirectReceiverGetsEverythingUnfiltered) {
 }
 
 TEST_F(VirtualPair, CarriesLongMessagesByReference) {
-  Bytes const sysex = Sysex(5000);
+  Bytes const sysex = CountingSysex(5000);
   destination.SendSysex(At(9), SysexRef(sysex.data(), sysex.size()));
   setup.ProcessInput();
   EXPECT_THAT(receiver.AllBytes(), ElementsAre(sysex));

@@ -6,8 +6,6 @@
 namespace Ostinet::Impl::Simulated {
 namespace {
 
-unsigned Code(HRESULT result) { return static_cast<unsigned>(result); }
-
 class MusicBufferTest : public SimulatedTest {
  protected:
   void SetUp() override {

@@ -22,6 +22,9 @@ inline SimulatedPort PortOf(std::string const& name, PortKind kind) {
   return port;
 }
 
+/// A result as the field writes it.
+inline unsigned Code(HRESULT result) { return static_cast<unsigned>(result); }
+
 inline std::string Narrow(WCHAR const* text) {
   std::string result;
   for (; *text != 0; ++text) result += static_cast<char>(*text);

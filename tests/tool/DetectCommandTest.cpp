@@ -6,7 +6,6 @@
 namespace Ostinet::Tool {
 namespace {
 
-using nlohmann::json;
 using testing::HasSubstr;
 
 // On one port, a Korg M1 and a Waldorf Blofeld, which answers by another input.

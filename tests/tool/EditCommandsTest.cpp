@@ -44,9 +44,9 @@ class EditCommands : public ToolTest {
     EXPECT_EQ(Kept(), before) << testing::PrintToString(arguments);
     return run.err;
   }
-  nlohmann::json List() { return nlohmann::json::parse(Do({"list", "--json"}).out); }
-  nlohmann::json FirstDevice() { return List()["devices"].at(0); }
-  nlohmann::json PortNamed(char const* list, std::string const& name) {
+  json List() { return json::parse(Do({"list", "--json"}).out); }
+  json FirstDevice() { return List()["devices"].at(0); }
+  json PortNamed(char const* list, std::string const& name) {
     auto const studio = List();
     for (auto const& port : studio[list]) {
       if (port["name"] == name) {
@@ -81,7 +81,7 @@ TEST_F(EditCommands, ADeviceIsMadeKeptAndDeleted) {
 
 TEST_F(EditCommands, ATakenNameGetsANumber) {
   Do({"device", "new", "Synth"});
-  auto const made = nlohmann::json::parse(Do({"device", "new", "--json", "Synth"}).out);
+  auto const made = json::parse(Do({"device", "new", "--json", "Synth"}).out);
   EXPECT_EQ(made["name"], "Synth 2");
   EXPECT_TRUE(made["uniqueID"].is_number());
   EXPECT_EQ(List()["devices"].size(), 2u);
@@ -164,12 +164,12 @@ TEST_F(EditCommands, PropertiesAreSetAndRead) {
   EXPECT_THAT(lines, testing::Contains("mixer: no"));
   EXPECT_THAT(lines, testing::Contains("channel-16: Drums"));
   EXPECT_THAT(lines, Not(testing::Contains(StartsWith("channel-2"))));
-  auto const json = nlohmann::json::parse(Do({"device", "get", "Synth", "--json"}).out);
-  EXPECT_EQ(json["name"], "Synth");
-  EXPECT_EQ(json["device-id"], 17);
-  EXPECT_EQ(json["receive-channels"], 0x20F);
-  EXPECT_EQ(json["drum-machine"], true);
-  EXPECT_EQ(json["channel-2"], "");
+  auto const answer = json::parse(Do({"device", "get", "Synth", "--json"}).out);
+  EXPECT_EQ(answer["name"], "Synth");
+  EXPECT_EQ(answer["device-id"], 17);
+  EXPECT_EQ(answer["receive-channels"], 0x20F);
+  EXPECT_EQ(answer["drum-machine"], true);
+  EXPECT_EQ(answer["channel-2"], "");
 }
 
 TEST_F(EditCommands, ADeviceOfWhichNothingWasSaidHasDefaults) {
@@ -178,8 +178,7 @@ TEST_F(EditCommands, ADeviceOfWhichNothingWasSaidHasDefaults) {
   EXPECT_EQ(Do({"device", "get", "Synth", "receive-channels"}).out, "all\n");
   EXPECT_EQ(Do({"device", "get", "Synth", "receives-notes"}).out, "yes\n");
   EXPECT_EQ(Do({"device", "get", "Synth", "receives-clock"}).out, "no\n");
-  EXPECT_TRUE(
-      nlohmann::json::parse(Do({"device", "get", "Synth", "--json"}).out)["device-id"].is_null());
+  EXPECT_TRUE(json::parse(Do({"device", "get", "Synth", "--json"}).out)["device-id"].is_null());
   Do({"device", "set", "Synth", "device-id", "5"});
   Do({"device", "set", "Synth", "device-id", "none"});
   EXPECT_EQ(Do({"device", "get", "Synth", "device-id"}).out, "none\n");
@@ -319,7 +318,7 @@ TEST_F(EditCommands, ADeletedDeviceLeavesNoNumberWithItsPort) {
 }
 
 TEST_F(EditCommands, AVirtualEndpointIsThereInEveryRunUntilItIsDeleted) {
-  auto const made = nlohmann::json::parse(Do({"virtual", "new", "Loop", "--json"}).out);
+  auto const made = json::parse(Do({"virtual", "new", "Loop", "--json"}).out);
   EXPECT_EQ(made["name"], "Loop");
   for (int run = 0; run < 2; ++run) {
     auto const source = PortNamed("sources", "Loop");

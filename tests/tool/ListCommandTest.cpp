@@ -11,12 +11,12 @@ using testing::Not;
 
 class ListCommand : public ToolTest {
  protected:
-  nlohmann::json ListJSON(std::string const& studio, std::vector<std::string> arguments = {}) {
+  json ListJSON(std::string const& studio, std::vector<std::string> arguments = {}) {
     arguments.insert(arguments.begin(), {"list", "--json"});
     ToolRun const run = RunOn(studio, arguments);
     EXPECT_EQ(run.exitCode, kDone) << run.err;
     EXPECT_EQ(run.err, "");
-    return nlohmann::json::parse(run.out);
+    return json::parse(run.out);
   }
 };
 
@@ -30,7 +30,7 @@ char const* const kManyPorts = R"({ "ports": [
 
 TEST_F(ListCommand, GivesEmptyListsForAStudioWithoutPorts) {
   EXPECT_EQ(ListJSON(R"({"ports": []})"),
-            nlohmann::json::parse(R"({"devices": [], "sources": [], "destinations": []})"));
+            json::parse(R"({"devices": [], "sources": [], "destinations": []})"));
 }
 
 TEST_F(ListCommand, PrintsNothingForAStudioWithoutPorts) {
@@ -41,7 +41,7 @@ TEST_F(ListCommand, PrintsNothingForAStudioWithoutPorts) {
 
 TEST_F(ListCommand, ShowsEachPortWithItsFacts) {
   auto const studio = ListJSON(kManyPorts);
-  std::map<std::string, nlohmann::json> byName;
+  std::map<std::string, json> byName;
   for (auto const& destination : studio["destinations"]) {
     byName[destination["name"]] = destination;
   }
@@ -54,7 +54,7 @@ TEST_F(ListCommand, ShowsEachPortWithItsFacts) {
     EXPECT_EQ(port["private"], false) << name;
     EXPECT_EQ(port["channels"], 65535) << name;
     EXPECT_TRUE(port["port"].is_null()) << name;
-    EXPECT_EQ(port["connected"], nlohmann::json::array()) << name;
+    EXPECT_EQ(port["connected"], json::array()) << name;
     EXPECT_NE(port["uniqueID"], 0) << name;
   }
   EXPECT_EQ(byName["Interface 1"]["software"], false);

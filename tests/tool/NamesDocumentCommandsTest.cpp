@@ -6,7 +6,6 @@
 namespace Ostinet::Tool {
 namespace {
 
-using nlohmann::json;
 using testing::HasSubstr;
 
 constexpr char kDocument[] =

@@ -51,10 +51,10 @@ std::vector<std::string> ToolRun::Lines() const {
   return lines;
 }
 
-std::vector<nlohmann::json> ToolRun::JSONLines() const {
-  std::vector<nlohmann::json> objects;
+std::vector<json> ToolRun::JSONLines() const {
+  std::vector<json> objects;
   for (std::string const& line : Lines()) {
-    objects.push_back(nlohmann::json::parse(line));
+    objects.push_back(json::parse(line));
   }
   return objects;
 }

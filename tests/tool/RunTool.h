@@ -9,6 +9,8 @@
 
 namespace Ostinet::Tool {
 
+using nlohmann::json;
+
 /// What a run of the program left behind. Lines end in a line feed on every system.
 struct ToolRun {
   int exitCode = -1;
@@ -17,7 +19,7 @@ struct ToolRun {
 
   std::vector<std::string> Lines() const;
   /// Each line of the output as JSON.
-  std::vector<nlohmann::json> JSONLines() const;
+  std::vector<json> JSONLines() const;
 };
 
 constexpr int kDone = 0;

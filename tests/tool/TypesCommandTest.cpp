@@ -6,7 +6,6 @@
 namespace Ostinet::Tool {
 namespace {
 
-using nlohmann::json;
 using testing::Contains;
 using testing::ElementsAre;
 using testing::HasSubstr;

@@ -62,8 +62,8 @@ TEST_F(Usage, TakesGlobalOptionsBeforeAndBehindTheCommand) {
       RunBare({"list", "-i", "--settings", settings, "--studio", studio, "--json"});
   EXPECT_EQ(before.exitCode, kDone) << before.err;
   EXPECT_EQ(behind.exitCode, kDone) << behind.err;
-  EXPECT_EQ(nlohmann::json::parse(before.out)["sources"][0]["name"], "In 1");
-  EXPECT_EQ(nlohmann::json::parse(behind.out)["sources"][0]["name"], "In 1");
+  EXPECT_EQ(json::parse(before.out)["sources"][0]["name"], "In 1");
+  EXPECT_EQ(json::parse(behind.out)["sources"][0]["name"], "In 1");
 }
 
 TEST_F(Usage, AStudioFileThatIsNotThereFails) {
@@ -107,7 +107,7 @@ TEST_F(Usage, GoesOnWithoutTheUsersOwnSettingsWhereTheyCannotBeKept) {
   ToolRun const run = RunShell("XDG_CONFIG_HOME=/dev/null PROGRAM list --json --studio \"" +
                                WriteFile("studio.json", kCabledStudio) + "\"");
   EXPECT_EQ(run.exitCode, kDone);
-  EXPECT_EQ(nlohmann::json::parse(run.out)["sources"].size(), 1u);
+  EXPECT_EQ(json::parse(run.out)["sources"].size(), 1u);
   EXPECT_THAT(run.err, HasSubstr("going on without settings"));
 }
 
@@ -131,7 +131,7 @@ TEST_F(Usage, SaysOnceWhereTheMachineHasNoMIDI) {
   ToolRun const run = RunShell("env -u OSTINET_STUDIO PROGRAM list --json --settings \"" +
                                PathOf("settings") + "\"");
   EXPECT_EQ(run.exitCode, kDone) << run.err;
-  EXPECT_TRUE(nlohmann::json::parse(run.out).contains("devices"));
+  EXPECT_TRUE(json::parse(run.out).contains("devices"));
   if (!run.err.empty()) {
     EXPECT_THAT(run.err, HasSubstr("--studio FILE.json"));
     EXPECT_EQ(std::count(run.err.begin(), run.err.end(), '\n'), 1) << run.err;
@@ -145,7 +145,7 @@ TEST_F(Usage, TheEnvironmentChoosesAStudioToo) {
   std::string const list = "PROGRAM list --json --settings \"" + PathOf("settings") + "\"";
   ToolRun const run = RunShell(set + list);
   ASSERT_EQ(run.exitCode, kDone) << run.err;
-  EXPECT_EQ(nlohmann::json::parse(run.out)["sources"][0]["name"], "In 1");
+  EXPECT_EQ(json::parse(run.out)["sources"][0]["name"], "In 1");
 }
 
 TEST_F(Usage, ABadStudioOfTheEnvironmentFails) {

@@ -14,7 +14,7 @@ namespace Ostinet::Impl {
 
 namespace {
 
-constexpr unsigned long long kShortMessageBytes = 4;
+constexpr unsigned long long kWordBytes = 4;
 
 /// Counts a sender in for the length of one message.
 class CountedIn {
@@ -169,7 +169,7 @@ void LegacyOutDevice::SendNow(unsigned char const* data, unsigned long long leng
   if (isClosing_ || handle == nullptr || length == 0) {
     return;
   }
-  if (length <= kShortMessageBytes) {
+  if (length <= kWordBytes) {
     DWORD message = 0;
     for (unsigned i = 0; i < length; ++i) {
       message |= static_cast<DWORD>(data[i]) << (8 * i);

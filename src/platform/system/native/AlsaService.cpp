@@ -17,10 +17,9 @@ namespace {
 // Where it is missing RtMidi throws, and both it and ALSA's library write to standard error; so the
 // device is looked at first.
 constexpr char kSequencerDevice[] = "/dev/snd/seq";
-constexpr char kWirePortName[] = "wire";
 // What a sysex is cut to: an event of this size fits the sequencer's memory also when others wait,
 // and every driver's.
-constexpr std::size_t kMaxPiece = 256;
+constexpr std::size_t kEncoderBytes = 256;
 
 template <class Midi>
 std::unique_ptr<Midi> MakeAlsaMidi(RtMidiErrors& errors) {
@@ -91,7 +90,7 @@ class AlsaOutputWire : public OutputWire {
     return false;
   }
 
-  std::size_t MaxPiece() const override { return kMaxPiece; }
+  std::size_t MaxPiece() const override { return kEncoderBytes; }
   bool IsUsable() const override { return true; }
 
  private:

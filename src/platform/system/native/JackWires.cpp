@@ -30,8 +30,6 @@ constexpr std::uint64_t kWindowCycles = 2;
 // A server joins ports from a later cycle on; what a wire sent before would reach nobody.
 constexpr std::uint64_t kJoinCycles = 3;
 
-constexpr char kWirePortName[] = "wire";
-
 // RtMidi makes the client at construction, and complains on standard error if the server has just
 // died; the look before keeps that to the width of a moment.
 template <class Midi>

@@ -28,6 +28,8 @@ class RtMidiErrors {
 /// The name under which this process's own clients of either service go; every list leaves out the
 /// ports of names that begin so, also those of other programs with this library.
 inline constexpr char kWireClientPrefix[] = "ostinet-wire-";
+/// The one port of such a client.
+inline constexpr char kWirePortName[] = "wire";
 /// Never the same twice.
 std::string NextWireClientName();
 
