@@ -1,11 +1,11 @@
 // SPDX-License-Identifier: MIT
 #include <gtest/gtest.h>
 
-#include <latch>
 #include <stdexcept>
 #include <vector>
 
 #include "core/JobThread.h"
+#include "support/Latch.h"
 #include "support/Printers.h"
 #include "support/Threads.h"
 
@@ -88,8 +88,8 @@ TEST(JobThreads, SurviveAJobThatThrows) {
 
 TEST(JobThreads, FinishTheRunningJobAndCancelTheOthersAtTheEnd) {
   VantorJobThread thread("Test Thread");
-  std::latch started(1);
-  std::latch goOn(1);
+  Testing::Latch started(1);
+  Testing::Latch goOn(1);
   auto const running = thread.Post<int>([&] {
     started.count_down();
     goOn.wait();

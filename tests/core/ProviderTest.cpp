@@ -3,12 +3,12 @@
 
 #include <atomic>
 #include <functional>
-#include <latch>
 #include <memory>
 #include <stdexcept>
 #include <thread>
 
 #include "ostinet/core/Provider.h"
+#include "support/Latch.h"
 #include "support/Threads.h"
 
 namespace Ostinet {
@@ -154,7 +154,7 @@ TEST(Provider, StaysWholeWhenADependentThrows) {
 
 TEST(ProviderThreads, WaitForACallBeforeTheDependentGoes) {
   ListenerProvider provider;
-  std::latch called(1);
+  Testing::Latch called(1);
   std::atomic<bool> isCalling{false};
   auto listener = std::make_unique<Listener>([&] {
     isCalling = true;

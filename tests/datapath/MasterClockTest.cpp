@@ -2,13 +2,13 @@
 #include <gtest/gtest.h>
 
 #include <atomic>
-#include <latch>
 #include <memory>
 #include <thread>
 #include <vector>
 
 #include "datapath/TimeBase.h"
 #include "ostinet/core/Error.h"
+#include "support/Latch.h"
 
 namespace Ostinet::Impl {
 namespace {
@@ -82,7 +82,7 @@ thread_local bool tBlocksInGetTime = false;
 
 class BlockingClock : public MasterClock {
  public:
-  BlockingClock(std::latch& entered, std::latch& release, std::atomic<bool>& destroyed)
+  BlockingClock(Testing::Latch& entered, Testing::Latch& release, std::atomic<bool>& destroyed)
       : entered_(entered), release_(release), destroyed_(destroyed) {}
   ~BlockingClock() override { destroyed_ = true; }
   unsigned long long GetTime() const override {
@@ -94,14 +94,14 @@ class BlockingClock : public MasterClock {
   }
 
  private:
-  std::latch& entered_;
-  std::latch& release_;
+  Testing::Latch& entered_;
+  Testing::Latch& release_;
   std::atomic<bool>& destroyed_;
 };
 
 TEST_F(MasterClockThreads, KeepTheClockWhileAReaderIsInIt) {
-  std::latch entered(1);
-  std::latch release(1);
+  Testing::Latch entered(1);
+  Testing::Latch release(1);
   std::atomic<bool> destroyed{false};
   SetMasterClock(std::make_unique<BlockingClock>(entered, release, destroyed));
   std::thread reader([] {
@@ -124,7 +124,7 @@ TEST_F(MasterClockThreads, KeepTheClockWhileAReaderIsInIt) {
 TEST_F(MasterClockThreads, ReadWhileTheClockComesAndGoes) {
   constexpr int kReaders = 3;
   std::atomic<bool> quit{false};
-  std::latch started(kReaders + 1);
+  Testing::Latch started(kReaders + 1);
   std::vector<std::thread> readers;
   for (int i = 0; i < kReaders; ++i) {
     readers.emplace_back([&] {

@@ -4,13 +4,13 @@
 #include <array>
 #include <atomic>
 #include <cstring>
-#include <latch>
 #include <thread>
 #include <vector>
 
 #include "datapath/ChannelPatchState.h"
 #include "datapath/MemorySysexStorage.h"
 #include "datapath/PacketQueue.h"
+#include "support/Latch.h"
 
 namespace Ostinet::Impl {
 namespace {
@@ -36,7 +36,7 @@ TEST(PacketQueueThreads, LoseNothingAndKeepEachProducersOrder) {
   constexpr std::size_t kProducers = 3;
   constexpr unsigned kPackets = 5000;
   PacketQueue queue;
-  std::latch start(kProducers + 1);
+  Testing::Latch start(kProducers + 1);
   std::vector<std::thread> producers;
   for (std::size_t producer = 0; producer < kProducers; ++producer) {
     producers.emplace_back([&, producer] {
@@ -65,7 +65,7 @@ TEST(PacketQueueThreads, LoseNothingAndKeepEachProducersOrder) {
 
 // The pool of nodes is one for all queues, whichever thread takes and gives back.
 TEST(PacketQueueThreads, ShareThePoolBetweenQueues) {
-  std::latch start(2);
+  Testing::Latch start(2);
   auto const run = [&start] {
     constexpr unsigned kPackets = 5000;
     PacketQueue queue;
@@ -90,7 +90,7 @@ TEST(SysexRefThreads, FreeAMessageOnWhicheverThreadIsLast) {
   Testing::SysexSession session;
   for (int round = 0; round < 200; ++round) {
     SysexRef ref(3);
-    std::latch start(2);
+    Testing::Latch start(2);
     std::thread other([&start, copy = ref]() mutable {
       start.arrive_and_wait();
       copy = SysexRef();
@@ -104,7 +104,7 @@ TEST(SysexRefThreads, FreeAMessageOnWhicheverThreadIsLast) {
 
 TEST(ChannelPatchStateThreads, ReportEveryLastPatch) {
   ChannelPatchState state;
-  std::latch start(2);
+  Testing::Latch start(2);
   std::thread sender([&] {
     start.arrive_and_wait();
     for (unsigned i = 0; i < 20000; ++i) {

@@ -4,10 +4,10 @@
 // watches; the tests themselves see that nothing is lost, stuck or left open.
 
 #include <atomic>
-#include <latch>
 #include <thread>
 
 #include "platform/PlatformTest.h"
+#include "support/Latch.h"
 
 namespace Ostinet::Testing {
 namespace {
@@ -46,7 +46,7 @@ class Background {
 
  private:
   std::atomic<bool> done_{false};
-  std::latch started_;
+  Testing::Latch started_;
   std::vector<std::thread> threads_;
 };
 

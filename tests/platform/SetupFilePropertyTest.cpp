@@ -34,6 +34,8 @@ class RandomStudio : public PlatformTest {
     return text;
   }
 
+  UString PathOf(char const* name) const { return (prefs.folder / name).u16string(); }
+
   PropertyDict DrawDict(int depth) {
     PropertyDict dict;
     for (int i = Draw(4); i > 0; --i) {
@@ -46,7 +48,7 @@ class RandomStudio : public PlatformTest {
           dict.entries[key] = std::vector<UString>{DrawText(), DrawText()};
           break;
         case 2:
-          dict.entries[key] = PropertyPath{prefs.FolderPath() + UString("/a b.midnam")};
+          dict.entries[key] = PropertyPath{PathOf("a b.midnam")};
           break;
         case 3:
           dict.entries[key] = DrawDict(depth - 1);
@@ -74,7 +76,7 @@ class RandomStudio : public PlatformTest {
           peer.SetDict(key, DrawDict(3));
           break;
         case 4:
-          peer.SetFile(key, prefs.FolderPath() + UString("/") + UString("x.png"));
+          peer.SetFile(key, PathOf("x.png"));
           break;
       }
     }

@@ -68,7 +68,7 @@ class EditCommands : public ToolTest {
 
 TEST_F(EditCommands, ADeviceIsMadeKeptAndDeleted) {
   ToolRun const made = Do({"device", "new", "Synth"});
-  EXPECT_THAT(made.out, testing::MatchesRegex("Synth  #[0-9]+\n"));
+  EXPECT_THAT(made.out, MatchesPattern("Synth  #[0-9]+\n"));
   auto const device = FirstDevice();
   EXPECT_EQ(device["name"], "Synth");
   EXPECT_EQ("Synth  #" + device["uniqueID"].dump() + "\n", made.out);

@@ -96,7 +96,7 @@ TEST_F(MonitorCommand, TellsBytesAndTimesWhenAsked) {
   ToolRun const run =
       Monitor(StudioWithInput(InputAt(50, "In 1", "90 3C 40")), {"--count", "1", "--hex", "--ts"});
   ASSERT_EQ(run.Lines().size(), 1u) << run.err;
-  EXPECT_THAT(run.Lines()[0], testing::MatchesRegex(" *[0-9]+\\.[0-9]+  In 1 +90 3C 40"));
+  EXPECT_THAT(run.Lines()[0], MatchesPattern(" *[0-9]+\\.[0-9]+  In 1 +90 3C 40"));
 }
 
 TEST_F(MonitorCommand, PrintsNoMoreThanTheCount) {

@@ -1,9 +1,11 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <nlohmann/json.hpp>
+#include <regex>
 #include <string>
 #include <vector>
 
@@ -21,6 +23,11 @@ struct ToolRun {
   /// Each line of the output as JSON.
   std::vector<json> JSONLines() const;
 };
+
+/// GoogleTest's own matcher knows no classes of characters on Windows.
+MATCHER_P(MatchesPattern, pattern, std::string("matches \"") + pattern + "\"") {
+  return std::regex_match(arg, std::regex(pattern));
+}
 
 constexpr int kDone = 0;
 constexpr int kFailed = 1;

@@ -9,7 +9,6 @@ namespace {
 using testing::Contains;
 using testing::ElementsAre;
 using testing::HasSubstr;
-using testing::MatchesRegex;
 using testing::SizeIs;
 
 /// The device types that ship, which the program finds in the tree that it was built in.
@@ -23,7 +22,7 @@ class Types : public ToolTest {
 TEST_F(Types, ListsTheMakers) {
   ToolRun const run = Run({"types"});
   EXPECT_EQ(run.exitCode, kDone) << run.err;
-  EXPECT_THAT(run.Lines(), Contains(MatchesRegex("Roland \\([0-9]+ models\\)")));
+  EXPECT_THAT(run.Lines(), Contains(MatchesPattern("Roland \\([0-9]+ models\\)")));
   EXPECT_THAT(run.Lines(), Contains("Strymon (1 model)"));
   json const makers = json::parse(Run({"types", "--json"}).out)["manufacturers"];
   EXPECT_GT(makers.size(), 30u);

@@ -2,11 +2,11 @@
 #include <gtest/gtest.h>
 
 #include <atomic>
-#include <semaphore>
 #include <thread>
 
 #include "platform/system/common/ChangeNotifier.h"
 #include "platform/system/common/ChangeWatch.h"
+#include "support/Latch.h"
 
 namespace Ostinet::Impl {
 namespace {
@@ -50,17 +50,17 @@ TEST(ChangeNotifier, APlaceOutlivesTheNotifier) {
 
 TEST(ChangeNotifier, GivingUpWaitsForARunningCall) {
   ChangeNotifier notifier;
-  std::binary_semaphore entered{0};
-  std::binary_semaphore mayLeave{0};
+  Testing::Latch entered(1);
+  Testing::Latch mayLeave(1);
   std::atomic<bool> left{false};
   auto place = notifier.Add([&] {
-    entered.release();
-    mayLeave.acquire();
+    entered.count_down();
+    mayLeave.wait();
     left = true;
   });
   std::thread notifying([&notifier] { notifier.Notify(); });
-  entered.acquire();
-  std::thread helper([&mayLeave] { mayLeave.release(); });
+  entered.wait();
+  std::thread helper([&mayLeave] { mayLeave.count_down(); });
   place.reset();
   EXPECT_TRUE(left);
   notifying.join();
@@ -70,14 +70,14 @@ TEST(ChangeNotifier, GivingUpWaitsForARunningCall) {
 TEST(ChangeWatch, TellsOnlyWhenALookFoundAChange) {
   std::atomic<int> looks{0};
   std::atomic<int> looksWhenTold{0};
-  std::binary_semaphore told{0};
+  Testing::Latch told(1);
   ChangeWatch watch([&looks] { return ++looks == 2; });
   auto const place = watch.Add([&] {
     looksWhenTold = looks.load();
-    told.release();
+    told.count_down();
   });
   watch.Hint();
-  EXPECT_TRUE(told.try_acquire_for(std::chrono::seconds(20)));
+  EXPECT_TRUE(told.wait_for(std::chrono::seconds(20)));
   EXPECT_EQ(looksWhenTold, 2);
 }
 

@@ -6,13 +6,13 @@
 
 #include <algorithm>
 #include <chrono>
-#include <latch>
 #include <semaphore>
 #include <thread>
 
 #include "platform/system/SystemWaits.h"
 #include "platform/system/native/JackService.h"
 #include "platform/system/native/NativeSystem.h"
+#include "support/Latch.h"
 #include "system/native/JackPeer.h"
 #include "system/native/JackServer.h"
 #include "system/native/MidiHost.h"
@@ -209,7 +209,7 @@ TEST_F(JackSystem, OutlivesAServerThatIsKilledInMidSend) {
   auto peer = std::make_unique<JackPeer>("Peer");
   HMIDIOUT const output = OpenOutput(u"Peer:in");
   InputHost input(*system_, Input(u"Peer:out"));
-  std::latch begun(1);
+  Testing::Latch begun(1);
   std::thread player([&] {
     // A full lane is no reason to stop, a dead server is.
     do {
