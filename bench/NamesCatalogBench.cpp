@@ -22,7 +22,7 @@ namespace {
 constexpr int kDocuments = 1000;
 
 /// A document of the usual size: eight banks of 32 patches, and names of the drums.
-std::string Document(int number) {
+std::string DocumentText(int number) {
   std::string content =
       "<?xml version=\"1.0\"?><MIDINameDocument><Author>Somebody</Author><MasterDeviceNames>"
       "<Manufacturer>Maker</Manufacturer><Model>Model " +
@@ -63,7 +63,7 @@ class NamesCatalogBench : public benchmark::Fixture {
     folder_ = std::make_unique<Testing::TemporaryFolder>();
     for (int i = 0; i < kDocuments; ++i) {
       folder_->Write("Maker " + std::to_string(i % 50) + "/" + std::to_string(i) + ".midnam",
-                     Document(i));
+                     DocumentText(i));
     }
     SystemServices::SetEnvironment("OSTINET_USER_FOLDER", UString(folder_->Path().c_str()));
     SystemServices::SetEnvironment("OSTINET_SYSTEM_FOLDER", UString("/nowhere"));
@@ -117,7 +117,7 @@ BENCHMARK_REGISTER_F(NamesCatalogBench, StartFromTheSavedBlock)
 // The baseline is what a renewal must look at in any case: the date of the document.
 void LookAtADate(benchmark::State& state) {
   Testing::TemporaryFolder const folder;
-  File const file = folder.Write("One.midnam", Document(1));
+  File const file = folder.Write("One.midnam", DocumentText(1));
   for (auto _ : state) {
     benchmark::DoNotOptimize(file.GetModDate());
   }
@@ -130,7 +130,7 @@ void RenewUnchangedNames(benchmark::State& state) {
   host.SignIn();
   Testing::TemporaryFolder const folder;
   Destination const destination = host.Dest("Port");
-  destination.SetNames(Names(Names::kMasterNames, folder.Write("One.midnam", Document(1))));
+  destination.SetNames(Names(Names::kMasterNames, folder.Write("One.midnam", DocumentText(1))));
   destination.CountModes();  // loads the names
   Impl::DestinationNames& names = *Impl::ImplOf(destination)->GetNames();
   for (auto _ : state) {

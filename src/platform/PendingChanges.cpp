@@ -15,6 +15,13 @@ void PendingChanges::Add(DeviceObjectImpl* object, UString const& key) {
   changes_[object->placeInChanges].keys.insert(key);
 }
 
-std::vector<PendingChanges::Change> PendingChanges::Take() { return std::exchange(changes_, {}); }
+std::vector<PendingChanges::Change> PendingChanges::Take() {
+  return std::exchange(changes_, std::exchange(room_, {}));
+}
+
+void PendingChanges::GiveBack(std::vector<Change> room) {
+  room.clear();
+  room_ = std::move(room);
+}
 
 }  // namespace Ostinet::Impl

@@ -20,12 +20,17 @@ class PendingChanges {
   };
 
   void Add(DeviceObjectImpl* object, UString const& key);
-  /// Gives all notes away.
+  /// Gives all notes away. Their room may be given back when they are worked off.
   std::vector<Change> Take();
-  void Clear() { changes_.clear(); }
+  void GiveBack(std::vector<Change> room);
+  void Clear() {
+    changes_.clear();
+    room_ = {};
+  }
 
  private:
   std::vector<Change> changes_;
+  std::vector<Change> room_;  // empty, for the next notes
 };
 
 }  // namespace Ostinet::Impl

@@ -3,7 +3,7 @@
 #include "platform/Reconciliation.h"
 
 #include <algorithm>
-#include <cstddef>
+#include <functional>
 #include <utility>
 #include <vector>
 
@@ -16,40 +16,58 @@ namespace Ostinet::Impl {
 
 namespace {
 
-// Sorted by name, each name once. A studio may have ten thousand of them, so they stand side by
-// side and their names are made once.
-template <class Thing>
-struct Named {
-  UString name;
-  Thing thing;
-  std::size_t order;  // in the list that it comes from
-};
-using PortsByName = std::vector<Named<PortInfo const*>>;
-using EndpointsByName = std::vector<Named<EndpointImpl*>>;
+// A studio may have ten thousand ports of which one came or went. So ports and endpoints meet by
+// the hash of their names, each endpoint is looked at once, and only what has to be done is put in
+// the order of the names.
 
-/// Of two things of one name the later one counts.
-template <class List>
-void SortByName(List& list) {
-  // Ties are told by their order, which spares the copy that a stable sort works on.
-  std::sort(list.begin(), list.end(), [](auto const& a, auto const& b) {
-    return a.name < b.name || (!(b.name < a.name) && a.order < b.order);
-  });
-  auto const ofOneName = [](auto const& a, auto const& b) { return a.name == b.name; };
-  list.erase(list.begin(), std::unique(list.rbegin(), list.rend(), ofOneName).base());
-}
+/// The ports of one direction. Of two of one name the later one counts.
+class PortsByName {
+ public:
+  struct Entry {
+    std::size_t hash;
+    PortInfo const* port;
+    bool isKnown = false;  // an endpoint bears its name
+  };
 
-template <class Endpoints>
-EndpointsByName ByName(Endpoints const& endpoints) {
-  EndpointsByName result;
-  result.reserve(endpoints.size());
-  for (auto const& endpoint : endpoints) {
-    if (endpoint->IsDirect() && !endpoint->IsVirtual() && !endpoint->IsInternalSoftware()) {
-      result.push_back({endpoint->GetName(), endpoint.get(), result.size()});
-    }
+  void Add(PortInfo const& port) {
+    entries_.push_back({std::hash<UString>()(NameOfPort(port)), &port});
   }
-  SortByName(result);
-  return result;
-}
+  /// To be called once, when all are there.
+  void Sort() {
+    std::reverse(entries_.begin(), entries_.end());
+    std::stable_sort(entries_.begin(), entries_.end(),
+                     [](Entry const& a, Entry const& b) { return a.hash < b.hash; });
+    auto const ofOneName = [](Entry const& a, Entry const& b) {
+      return a.hash == b.hash && NameOfPort(*a.port) == NameOfPort(*b.port);
+    };
+    entries_.erase(std::unique(entries_.begin(), entries_.end(), ofOneName), entries_.end());
+  }
+  /// Null if there is none.
+  Entry* Find(UString const& name) {
+    std::size_t const hash = std::hash<UString>()(name);
+    auto place = std::lower_bound(entries_.begin(), entries_.end(), hash,
+                                  [](Entry const& entry, std::size_t h) { return entry.hash < h; });
+    for (; place != entries_.end() && place->hash == hash; ++place) {
+      if (NameOfPort(*place->port) == name) {
+        return &*place;
+      }
+    }
+    return nullptr;
+  }
+  std::vector<Entry> const& Entries() const { return entries_; }
+
+ private:
+  std::vector<Entry> entries_;
+};
+
+struct Step {
+  UString name;
+  PortInfo const* port;    // null: it is gone
+  EndpointImpl* endpoint;  // null: there is none yet
+};
+using Steps = std::vector<Step>;
+
+void SetOnline(EndpointImpl& endpoint) { endpoint.Peer()->SetInt(Keys::kOffline, 0); }
 
 /// The endpoint's port is gone. True if it was online until now.
 bool TakeOffline(EndpointImpl& endpoint) {
@@ -63,64 +81,63 @@ bool TakeOffline(EndpointImpl& endpoint) {
   return wasOffline == 0;
 }
 
-/// The endpoints that were found with their ports, each at its place in the studio's list. All get
-/// their "offline" written, as hosts rely on, but in the order of the list and not of the names:
-/// that is how they lie in memory.
-class Present {
- public:
-  explicit Present(std::size_t count) : endpoints_(count) {}
-  void Add(Named<EndpointImpl*> const& endpoint) { endpoints_[endpoint.order] = endpoint.thing; }
-  void SetOnline() {
-    for (EndpointImpl* const endpoint : endpoints_) {
-      if (endpoint != nullptr) {
-        endpoint->Peer()->SetInt(Keys::kOffline, 0);
-      }
-    }
-  }
-
- private:
-  std::vector<EndpointImpl*> endpoints_;
-};
-
 /// Port and endpoint bear one name. A name that stays while the port changes its kind leaves
 /// both untouched: hosts keep such an endpoint as it was until the port comes back.
-bool Join(PortAttacher& attacher, PortInfo const& port, Named<EndpointImpl*> const& endpoint,
-          Present& present) {
-  if (!PortAttacher::IsPair(*endpoint.thing, port)) {
-    return false;
+void Join(PortInfo const& port, EndpointImpl& endpoint, UString name, Steps& steps) {
+  if (!PortAttacher::IsPair(endpoint, port)) {
+    return;
   }
-  WinMIDIPort* const peer = WinMIDIPort::Of(*endpoint.thing);
-  bool const isDetached = peer != nullptr && peer->GetActiveImpl() == nullptr;
-  if (isDetached) {
-    attacher.Attach(port);
+  WinMIDIPort const* const peer = WinMIDIPort::Of(endpoint);
+  if (peer != nullptr && peer->GetActiveImpl() == nullptr) {
+    steps.push_back({std::move(name), &port, &endpoint});
+  } else {
+    SetOnline(endpoint);  // written each time, as hosts rely on
   }
-  present.Add(endpoint);
-  return isDetached;
 }
 
-bool Merge(PortAttacher& attacher, PortsByName const& ports, EndpointsByName const& endpoints,
-           std::size_t count) {
-  bool changed = false;
-  Present present(count);
-  auto port = ports.begin();
-  auto endpoint = endpoints.begin();
-  while (port != ports.end() || endpoint != endpoints.end()) {
-    bool const isNewPort =
-        endpoint == endpoints.end() || (port != ports.end() && port->name < endpoint->name);
-    if (isNewPort) {
-      attacher.Attach(*port->thing);
-      changed = true;
-      ++port;
-    } else if (port == ports.end() || endpoint->name < port->name) {
-      changed |= TakeOffline(*endpoint->thing);
-      ++endpoint;
-    } else {
-      changed |= Join(attacher, *port->thing, *endpoint, present);
-      ++port;
-      ++endpoint;
+/// What has to be done in the order of the names. Of two endpoints of one name the later one
+/// counts, so they are looked at from the end.
+template <class Endpoints>
+Steps FindSteps(PortsByName ports, Endpoints const& endpoints) {
+  Steps steps;
+  for (auto place = endpoints.rbegin(); place != endpoints.rend(); ++place) {
+    EndpointImpl& endpoint = **place;
+    if (!endpoint.IsDirect() || endpoint.IsVirtual() || endpoint.IsInternalSoftware()) {
+      continue;
+    }
+    UString name = endpoint.GetName();
+    PortsByName::Entry* const listed = ports.Find(name);
+    if (listed == nullptr) {
+      steps.push_back({std::move(name), nullptr, &endpoint});
+    } else if (!std::exchange(listed->isKnown, true)) {
+      Join(*listed->port, endpoint, std::move(name), steps);
     }
   }
-  present.SetOnline();
+  for (PortsByName::Entry const& listed : ports.Entries()) {
+    if (!listed.isKnown) {
+      steps.push_back({NameOfPort(*listed.port), listed.port, nullptr});
+    }
+  }
+  std::stable_sort(steps.begin(), steps.end(),
+                   [](Step const& a, Step const& b) { return a.name < b.name; });
+  auto const ofOneName = [](Step const& a, Step const& b) { return a.name == b.name; };
+  steps.erase(std::unique(steps.begin(), steps.end(), ofOneName), steps.end());
+  return steps;
+}
+
+bool Take(Steps const& steps, PortAttacher& attacher) {
+  bool changed = false;
+  for (Step const& step : steps) {
+    if (step.port == nullptr) {
+      changed |= TakeOffline(*step.endpoint);
+      continue;
+    }
+    changed = true;
+    attacher.Attach(*step.port);
+    if (step.endpoint != nullptr) {
+      SetOnline(*step.endpoint);
+    }
+  }
   return changed;
 }
 
@@ -128,21 +145,15 @@ bool Merge(PortAttacher& attacher, PortsByName const& ports, EndpointsByName con
 
 bool Reconcile(WinMIDISetup& setup, PortAttacher& attacher, PortList const& ports) {
   PortsByName newSources, newDestinations;
-  newSources.reserve(ports.size());
-  newDestinations.reserve(ports.size());
   for (PortInfo const& port : ports) {
-    PortsByName& list = IsSource(port) ? newSources : newDestinations;
-    list.push_back({NameOfPort(port), &port, list.size()});
+    (IsSource(port) ? newSources : newDestinations).Add(port);
   }
-  SortByName(newSources);
-  SortByName(newDestinations);
+  newSources.Sort();
+  newDestinations.Sort();
   auto const& studio = setup.Lists();
-  EndpointsByName const sources = ByName(studio.sources);
-  EndpointsByName const destinations = ByName(studio.destinations);
-  std::size_t const sourceCount = studio.sources.size();
-  std::size_t const destinationCount = studio.destinations.size();
-  bool const sourcesChanged = Merge(attacher, newSources, sources, sourceCount);
-  bool const destinationsChanged = Merge(attacher, newDestinations, destinations, destinationCount);
+  bool const sourcesChanged = Take(FindSteps(std::move(newSources), studio.sources), attacher);
+  bool const destinationsChanged =
+      Take(FindSteps(std::move(newDestinations), studio.destinations), attacher);
   return sourcesChanged || destinationsChanged;
 }
 

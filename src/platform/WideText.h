@@ -1,7 +1,9 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
+#include <string>
 
 #include "ostinet/core/UString.h"
 #include "platform/system/WindowsTypes.h"
@@ -11,11 +13,8 @@ namespace Ostinet::Impl {
 /// The text of a fixed array of the system's, which need not end in a 0.
 template <std::size_t N>
 UString TextOf(WCHAR const (&text)[N]) {
-  UString result;
-  for (std::size_t i = 0; i < N && text[i] != 0; ++i) {
-    result += static_cast<unsigned short>(text[i]);
-  }
-  return result;
+  std::size_t const length = static_cast<std::size_t>(std::find(text, text + N, WCHAR{0}) - text);
+  return UString(std::u16string(text, text + length));
 }
 
 }  // namespace Ostinet::Impl

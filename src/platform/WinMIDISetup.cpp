@@ -191,12 +191,14 @@ bool WinMIDISetup::PlatformPollSetupChanges(bool& connectionsChanged) {
 bool WinMIDISetup::HandlePendingChanges(bool& connectionsChanged) {
   // What the objects do may change properties anew: those wait for the next round.
   bool notify = false;
-  for (auto const& [object, keys] : pendingChanges_.Take()) {
+  std::vector<PendingChanges::Change> changes = pendingChanges_.Take();
+  for (auto const& [object, keys] : changes) {
     if (object->Exists()) {
       notify = true;
       connectionsChanged |= object->HandlePropertyChanges(keys);
     }
   }
+  pendingChanges_.GiveBack(std::move(changes));
   return notify;
 }
 
