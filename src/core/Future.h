@@ -38,7 +38,7 @@ class VantorFuture : private Noncopyable<VantorFuture<T>> {
       }
     }
     if (error_) {
-      throw *error_;
+      throw VantorError(*error_);
     }
     return value_;
   }

@@ -237,7 +237,7 @@ class Writer::Output {
   template <class Call>
   void Try(Call call) {
     if (failure_) {
-      throw *failure_;
+      throw VantorError(*failure_);
     }
     try {
       call();

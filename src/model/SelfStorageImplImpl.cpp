@@ -96,7 +96,8 @@ bool SelfStorageImplImpl::Write(UString const& key, PropertyValue value) {
 }
 
 void SelfStorageImplImpl::RemoveProperty(UString const& key) {
-  UString const removed = key;  // which may be the store's own
+  // The key may be the store's own.
+  UString const removed = key;  // NOLINT(performance-unnecessary-copy-initialization)
   Erase(removed);
   PropChangedInternal(removed);
 }

@@ -111,7 +111,7 @@ void Setup::Panic() {
   constexpr unsigned char kControlChange = 0xB0;
   constexpr unsigned char kAllSoundOff = 120;
   constexpr unsigned char kSustain = 64;
-  std::array<std::array<unsigned char, 3>, 32> messages;
+  std::array<std::array<unsigned char, 3>, 32> messages{};
   for (std::size_t i = 0; i < messages.size(); ++i) {
     auto const status = static_cast<unsigned char>(kControlChange + i / 2);
     messages[i] = {status, i % 2 == 0 ? kAllSoundOff : kSustain, 0};
