@@ -4,6 +4,7 @@
 // file's date stays, and handed from one session to the next.
 #include "names/NamesCatalogImpl.h"
 
+#include <cmath>
 #include <map>
 #include <utility>
 
@@ -18,9 +19,7 @@ namespace {
 constexpr double kTicksPerSecond = 60.0;
 constexpr long long kTicksBetweenScans = 3600;
 
-long long Now() {
-  return static_cast<long long>(VantorSystemTime::GetCurrentEventTime() * kTicksPerSecond + 0.5);
-}
+long long Now() { return std::llround(VantorSystemTime::GetCurrentEventTime() * kTicksPerSecond); }
 
 /// Gathers the documents of a scan; what stands in `old` under the same date is taken over.
 class Visitor : public XMLFilesVisitor {

@@ -8,17 +8,17 @@ using Impl::NamesCatalogImpl;
 using ::testing::IsEmpty;
 using ::testing::SizeIs;
 
-using Bytes = std::vector<unsigned char>;
+using Block = std::vector<unsigned char>;
 
 constexpr int kBlock = 1;
 
-void AddNumber(Bytes& bytes, std::size_t number) {
+void AddNumber(Block& bytes, std::size_t number) {
   for (int i = 0; i < 4; ++i, number >>= 8) {
     bytes.push_back(static_cast<unsigned char>(number));
   }
 }
 
-void AddText(Bytes& bytes, std::string const& text) {
+void AddText(Block& bytes, std::string const& text) {
   AddNumber(bytes, text.size());
   for (char const c : text) {
     bytes.push_back(static_cast<unsigned char>(c));
@@ -27,20 +27,20 @@ void AddText(Bytes& bytes, std::string const& text) {
 }
 
 /// What a length covers, behind the length.
-Bytes Part(Bytes const& content) {
-  Bytes part;
+Block Part(Block const& content) {
+  Block part;
   AddNumber(part, content.size() + 4);
   part.insert(part.end(), content.begin(), content.end());
   return part;
 }
 
-Bytes operator+(Bytes a, Bytes const& b) {
+Block operator+(Block a, Block const& b) {
   a.insert(a.end(), b.begin(), b.end());
   return a;
 }
 
-Bytes Version(unsigned version) {
-  Bytes bytes;
+Block Version(unsigned version) {
+  Block bytes;
   AddNumber(bytes, version);
   return bytes;
 }
@@ -79,7 +79,7 @@ TEST_F(NamesCatalogStateTest, TheBlockIsWrittenByteForByte) {
   SearchAll();
   catalog.SaveState(prefs);
 
-  Bytes record;
+  Block record;
   AddText(record, file.GetFullPath().string().substr(folders.PathOf("user").string().size()));
   AddText(record, "W");
   AddNumber(record, 1);  // masters
@@ -169,7 +169,7 @@ TEST_F(NamesCatalogStateTest, AFolderThatIsNotThereHasAnEmptySectionAndIsSkipped
 // A part that is longer than what is known of it may come from a later library.
 TEST_F(NamesCatalogStateTest, WhatStandsBehindARecordsFieldsIsPassedOver) {
   WriteSomeDocuments();
-  Bytes record;
+  Block record;
   AddText(record, "/A.midnam");
   AddText(record, "author");
   for (int i = 0; i < 4; ++i) {
@@ -186,7 +186,7 @@ TEST_F(NamesCatalogStateTest, EveryPrefixOfABlockGivesNothing) {
   WriteSomeDocuments();
   SearchAll();
   catalog.SaveState(prefs);
-  Bytes const whole = prefs.blocks[kBlock];
+  Block const whole = prefs.blocks[kBlock];
   for (std::size_t size = 0; size < whole.size(); ++size) {
     prefs.blocks[kBlock].assign(whole.begin(), whole.begin() + static_cast<std::ptrdiff_t>(size));
     ASSERT_NO_THROW(catalog.LoadState(prefs)) << size;
@@ -198,9 +198,9 @@ TEST_F(NamesCatalogStateTest, NoChangedByteReadsOutsideTheBlock) {
   WriteSomeDocuments();
   SearchAll();
   catalog.SaveState(prefs);
-  Bytes const whole = prefs.blocks[kBlock];
+  Block const whole = prefs.blocks[kBlock];
   for (std::size_t place = 0; place < whole.size(); ++place) {
-    for (unsigned char const value : Bytes{0x00, 0x01, 0x7F, 0xFF}) {
+    for (unsigned char const value : Block{0x00, 0x01, 0x7F, 0xFF}) {
       prefs.blocks[kBlock] = whole;
       prefs.blocks[kBlock][place] = value;
       ASSERT_NO_THROW(catalog.LoadState(prefs)) << place;
@@ -211,7 +211,7 @@ TEST_F(NamesCatalogStateTest, NoChangedByteReadsOutsideTheBlock) {
 
 TEST_F(NamesCatalogStateTest, ALengthThatDoesNotMoveOnEndsTheLoading) {
   WriteSomeDocuments();
-  prefs.blocks[kBlock] = Version(6) + Part(Bytes(8)) + Part({});
+  prefs.blocks[kBlock] = Version(6) + Part(Block(8)) + Part({});
   catalog.LoadState(prefs);
   EXPECT_THAT(catalog.GetDocuments(), IsEmpty());
 }

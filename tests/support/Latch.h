@@ -27,6 +27,10 @@ class Latch {
     std::unique_lock lock(mutex_);
     return opened_.wait_for(lock, time, [this] { return left_ <= 0; });
   }
+  bool try_wait() {
+    std::lock_guard const lock(mutex_);
+    return left_ <= 0;
+  }
   void arrive_and_wait() {
     count_down();
     wait();

@@ -9,7 +9,7 @@
 
 namespace Ostinet::Testing {
 
-constexpr auto kPatience = std::chrono::seconds(30);
+constexpr auto kPeerPatience = std::chrono::seconds(30);
 
 JackPeer::JackPeer(std::string const& name) {
   client_ = jack_client_open(name.c_str(), JackNoStartServer, nullptr);
@@ -52,7 +52,7 @@ void JackPeer::TakeHeard() {
 
 template <class Enough>
 void JackPeer::WaitUntil(Enough enough) {
-  auto const deadline = std::chrono::steady_clock::now() + kPatience;
+  auto const deadline = std::chrono::steady_clock::now() + kPeerPatience;
   for (TakeHeard(); !enough() && std::chrono::steady_clock::now() < deadline; TakeHeard()) {
     std::this_thread::sleep_for(std::chrono::milliseconds(1));
   }

@@ -5,7 +5,7 @@
 
 namespace Ostinet::Testing {
 
-constexpr auto kPatience = std::chrono::seconds(30);
+constexpr auto kHostPatience = std::chrono::seconds(30);
 
 InputHost::InputHost(Impl::System& system, UINT device, int buffers) : system_(system) {
   opened_ = system_.midiInOpen(&handle_, device, reinterpret_cast<DWORD_PTR>(&OnMessage),
@@ -58,7 +58,7 @@ void InputHost::Take(UINT message, DWORD_PTR param1, DWORD_PTR param2) {
 
 std::vector<InputHost::Piece> InputHost::WaitForPieces(std::size_t count) {
   std::unique_lock lock(mutex_);
-  arrived_.wait_for(lock, kPatience, [&] { return pieces_.size() >= count; });
+  arrived_.wait_for(lock, kHostPatience, [&] { return pieces_.size() >= count; });
   return pieces_;
 }
 
