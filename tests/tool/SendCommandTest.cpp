@@ -104,7 +104,7 @@ TEST_F(SendCommand, FailsWhereItIsInterruptedBeforeTheEnd) {
   }
   std::string const studio = WriteFile("studio.json", kCabledStudio);
   ToolRun const run = RunShell(
-      "timeout --preserve-status -s INT 2 PROGRAM send 'Out 1' F8 +3600000 FA --studio \"" +
+      "timeout --preserve-status -s INT 5 PROGRAM send 'Out 1' F8 +3600000 FA --studio \"" +
       studio + "\" --settings \"" + PathOf("settings") + "\"");
   EXPECT_EQ(run.exitCode, kFailed);
   EXPECT_EQ(run.err, "ostinet: interrupted before all messages had gone out\n");

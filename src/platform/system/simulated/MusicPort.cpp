@@ -70,6 +70,9 @@ MusicPort::MusicPort(std::shared_ptr<Studio> studio, PortPtr port)
       port_(std::move(port)) {}
 
 MusicPort::~MusicPort() {
+  if (latencyClock_ != nullptr) {
+    latencyClock_->Release();
+  }
   std::lock_guard lock(GetStudio().Mutex());
   DetachLocked();
 }
@@ -213,7 +216,11 @@ HRESULT MusicPort::GetLatencyClock(IReferenceClock** clock) {
   HRESULT result = S_OK;
   if (Fails(Op::kGetLatencyClock, result)) return result;
   if (clock == nullptr) return E_POINTER;
-  *clock = new StudioClock(SharedStudio(), port_->spec.latencyMicroseconds * 10);
+  std::call_once(latencyClockMade_, [this] {
+    latencyClock_ = new StudioClock(SharedStudio(), port_->spec.latencyMicroseconds * 10);
+  });
+  latencyClock_->AddRef();
+  *clock = latencyClock_;
   return Log(Op::kGetLatencyClock, S_OK);
 }
 

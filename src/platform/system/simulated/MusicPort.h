@@ -2,6 +2,7 @@
 #pragma once
 
 #include <deque>
+#include <mutex>
 #include <vector>
 
 #include "platform/system/simulated/ComObject.h"
@@ -73,6 +74,8 @@ class MusicPort final : public ComObject<IDirectMusicPort>,
   void Arrive(std::vector<std::uint8_t> bytes);
 
   PortPtr const port_;
+  std::once_flag latencyClockMade_;
+  StudioClock* latencyClock_ = nullptr;  // one for all who ask
   // Guarded by the studio's mutex.
   bool active_ = false;
   HANDLE notification_ = nullptr;
