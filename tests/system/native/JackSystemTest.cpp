@@ -200,9 +200,9 @@ TEST_F(JackSystem, ResetEndsTheNotesThatSound) {
   system_->midiOutShortMsg(output, 0x403C92);
   peer.WaitForEvents(1);
   system_->midiOutReset(output);
-  system_->midiOutClose(output);
   std::vector<Bytes> const expected = {{0x92, 0x3C, 0x40}, {0x82, 0x3C, 0x40}};
   EXPECT_EQ(peer.WaitForEvents(2), expected);
+  system_->midiOutClose(output);
 }
 
 TEST_F(JackSystem, OutlivesAServerThatIsKilledInMidSend) {
