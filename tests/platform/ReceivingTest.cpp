@@ -270,6 +270,29 @@ TEST_F(DirectMusicInput, AnEndlessDriverDoesNotHangThePoll) {
   midi.SetEndless("Read", false);
 }
 
+// What stood behind the packet in the same buffer goes with the port.
+TEST_F(DirectMusicInput, ItsReceiverMaySignOut) {
+  midi.Inject("In", {0x90, 1, 1});
+  midi.Inject("In", {0x90, 2, 1});
+  receiver.onPacket = [this](Bytes const&) { SignOut(); };
+  setup.ProcessInput();
+  EXPECT_FALSE(setup.IsSignedIn());
+  EXPECT_THAT(receiver.AllBytes(), ElementsAre(Bytes{0x90, 1, 1}));
+}
+
+TEST_F(DirectMusicInput, ItsReceiverMayPollWhileThePortGoes) {
+  midi.Inject("In", {0x90, 1, 1});
+  midi.Inject("In", {0x90, 2, 1});
+  Source const in = Src("In");
+  receiver.onPacket = [this](Bytes const&) {
+    midi.RemovePort("In");
+    Rescan();
+  };
+  setup.ProcessInput();
+  EXPECT_FALSE(in.IsOnline());
+  EXPECT_THAT(receiver.AllBytes(), ElementsAre(Bytes{0x90, 1, 1}));
+}
+
 class VirtualPair : public PlatformTest {
  protected:
   VirtualPair() {

@@ -283,6 +283,14 @@ TEST_F(LegacySender, AStampInThePastLeavesAtOnce) {
   EXPECT_THAT(TimesLeft("Out"), ElementsAre(0, 0));
 }
 
+TEST_F(LegacySender, AStampHalfTheRangeAheadWaits) {
+  Send(out, {0x90, 1, 1}, kStart + (1ull << 63));
+  midi.Settle();
+  EXPECT_THAT(SentTo("Out"), IsEmpty());
+  Send(out, {0x90, 2, 1}, kStart + (1ull << 63) + 1);  // nearer backwards: in the past
+  EXPECT_THAT(SentTo("Out"), ElementsAre(Bytes{0x90, 2, 1}));
+}
+
 TEST_F(LegacySender, AFullQueueLosesTheNewest) {
   Send(out, {0x90, 0, 1}, kStart + 1000);
   midi.Settle();  // the output thread has taken the first one's place in the count
