@@ -331,6 +331,21 @@ TEST_F(VirtualPair, CarriesLongMessagesByReference) {
   EXPECT_THAT(receiver.AllBytes(), ElementsAre(sysex));
 }
 
+TEST_F(VirtualPair, AReceiverThatThrowsIsHeardAndLosesOnePacket) {
+  for (unsigned char i = 1; i <= 3; ++i) {
+    Send(destination, {0x90, i, 1});
+  }
+  receiver.onPacket = [](Bytes const& bytes) {
+    if (bytes[1] == 2) {
+      throw std::runtime_error("host");
+    }
+  };
+  EXPECT_THROW(setup.ProcessInput(), std::runtime_error);
+  setup.ProcessInput();
+  EXPECT_EQ(receiver.AllBytes().back(), (Bytes{0x90, 3, 1}));
+  EXPECT_EQ(receiver.packets.size(), 3u);
+}
+
 TEST_F(VirtualPair, OnlyTheWantedEndIsPublic) {
   EXPECT_EQ(setup.CountSources(), 1);
   EXPECT_EQ(setup.CountPrivateDestinations(), 1);
