@@ -2,8 +2,9 @@
 #include "ostinet/hostkit/FolderPrefs.h"
 
 #include <algorithm>
-#include <cstdlib>
 #include <exception>
+
+#include "ostinet/core/Environment.h"
 
 namespace Ostinet {
 namespace {
@@ -80,9 +81,9 @@ void FolderPrefs::Keep(std::string const& error) {
 
 Folder FolderPrefs::UserFolder(std::string const& program) {
   for (UserPlace const& place : kUserPlaces) {
-    char const* const value = std::getenv(place.variable);
-    if (value != nullptr && *value != '\0') {
-      Folder const above{FileSpecification(UString(std::string(value) + place.below))};
+    UString const value = EnvironmentText(place.variable);
+    if (!value.empty()) {
+      Folder const above{FileSpecification(value + place.below)};
       return above.GetSubFolder(UString(place.lowerCase ? LowerCase(program) : program));
     }
   }

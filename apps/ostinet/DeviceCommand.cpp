@@ -55,12 +55,14 @@ void TakeAllOffPorts(Device const& device) {
 void Delete(GlobalOptions const& globals, DeviceOptions const& options) {
   Session session(globals, nullptr, nullptr);
   Device const device = FindDevice(session.GetSetup(), options.device);
+  NamedObject const gone = Named(device);
   TakeAllOffPorts(device);
   session.GetSetup().DeleteDevice(device);
   if (device.Exists()) {
     throw Failure("the device \"" + device.GetName().string() + "\" is the system's own");
   }
   session.Save();
+  PrintNamed(globals, gone);
 }
 
 void Rename(GlobalOptions const& globals, DeviceOptions const& options) {
@@ -79,7 +81,10 @@ void Rename(GlobalOptions const& globals, DeviceOptions const& options) {
 void ChangeType(GlobalOptions const& globals, DeviceOptions const& options) {
   DeviceTypeInfo const type = FindDeviceType(options.maker, options.model);
   Session session(globals, nullptr, nullptr);
-  session.GetSetup().ChangeDeviceType(FindDevice(session.GetSetup(), options.device), type);
+  Device const device = FindDevice(session.GetSetup(), options.device);
+  PortsInUse const ports = PortsOf(device);
+  session.GetSetup().ChangeDeviceType(device, type);
+  ListAnew(ports);  // The type may have fewer ends.
   session.Save();
 }
 

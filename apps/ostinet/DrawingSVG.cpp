@@ -34,7 +34,10 @@ constexpr char kStyle[] = R"(
   .halo { fill: none; stroke: #f6f7f9; stroke-width: 5.5; }
   .legend { font-size: 12px; fill: #6b7280; })";
 
-constexpr double kLetterWidth = 0.54;  // of the size of the letters, on the average
+// Of the size of the letters: the average of those of the alphabets, and of East Asia's square
+// ones.
+constexpr double kLetterWidth = 0.56;
+constexpr double kSquareWidth = 1.0;
 
 std::string Number(double value) {
   std::ostringstream text;
@@ -44,6 +47,11 @@ std::string Number(double value) {
 }
 
 bool StartsLetter(char c) { return (static_cast<unsigned char>(c) & 0xC0) != 0x80; }
+
+// The width of the letter that starts with this byte of UTF-8. Square ones stand from U+3000 on.
+double WidthOf(char c) {
+  return static_cast<unsigned char>(c) >= 0xE3 ? kSquareWidth : kLetterWidth;
+}
 
 std::string Escaped(std::string const& text) {
   std::string escaped;
@@ -71,16 +79,17 @@ std::string Escaped(std::string const& text) {
 
 // What fits into a width, with an ellipsis where letters were left out.
 std::string Shortened(std::string const& text, double width, double size) {
-  auto const room = static_cast<std::size_t>(width / (size * kLetterWidth));
-  std::size_t letters = 0;
-  std::size_t cut = 0;
+  double const room = width / size;
+  double taken = 0;
+  std::size_t cut = 0;  // behind the last letter that leaves room for the ellipsis
   for (std::size_t i = 0; i < text.size(); ++i) {
-    if (StartsLetter(text[i])) {
-      cut = letters + 1 == room ? i : cut;
-      ++letters;
+    if (!StartsLetter(text[i])) {
+      continue;
     }
+    cut = taken + kLetterWidth <= room ? i : cut;
+    taken += WidthOf(text[i]);
   }
-  return letters <= room ? text : text.substr(0, cut) + "…";
+  return taken <= room ? text : text.substr(0, cut) + "…";
 }
 
 class Document {

@@ -34,9 +34,11 @@ void DeleteEntity(GlobalOptions const& globals, EntityOptions const& options) {
   Session session(globals, nullptr, nullptr);
   Device const device = FindDevice(session.GetSetup(), options.device);
   Entity const entity = Find(EntitiesOf(device), options.entity, "entity");
+  NamedObject const gone = Named(entity);
   TakeOffPorts(entity);
   session.GetSetup().DeleteEntity(entity);
   session.Save();
+  PrintNamed(globals, gone);
 }
 
 }  // namespace

@@ -7,6 +7,7 @@
 #include "Interrupt.h"
 #include "Output.h"
 #include "Studio.h"
+#include "ostinet/core/XML.h"
 
 namespace Ostinet::Tool {
 namespace {
@@ -15,6 +16,8 @@ struct SignInFault {
   Setup::SignInResult result;
   char const* sentence;
 };
+
+constexpr char kStudioFile[] = "Ostinet.xml";
 
 constexpr SignInFault kSignInFaults[] = {
     {Setup::kSignInAlreadySignedIn, "the MIDI system is in use already"},
@@ -57,6 +60,23 @@ std::unique_ptr<FolderPrefs> OpenSettings(std::string const& path) {
     return nullptr;
   }
   return prefs;
+}
+
+// Why the studio in a file cannot be read to its end; empty where it can, or where there is none.
+std::string FaultOf(File const& file) {
+  try {
+    if (!file.IsFile() || file.Read().empty()) {
+      return "";
+    }
+    XMLLib::Parser parser(file);
+    if (!parser.DownToChild("Ostinet")) {
+      return "it is another kind of file";
+    }
+    parser.UpToParent();  // reads all of it
+    return "";
+  } catch (std::exception const& error) {
+    return error.what();
+  }
 }
 
 // What a save must have changed: a new file took the place of the old one.
@@ -113,8 +133,21 @@ Session::Session(GlobalOptions const& options, Receiver* receiver, SetupListener
   }
   if (prefs_ != nullptr) {
     virtualEndpoints_.Load(FileInSettings(kVirtualEndpointsFile));
+    LookForDamage();
   }
   SignIn(receiver, listener);
+}
+
+// The library reads up to the damage and says nothing of it; to save that much only would lose the
+// rest for good.
+void Session::LookForDamage() {
+  File const file = FileInSettings(kStudioFile);
+  std::string const fault = FaultOf(file);
+  if (!fault.empty()) {
+    damage_ =
+        "the studio in \"" + file.GetFullPath().string() + "\" cannot be read to its end: " + fault;
+    Notify(damage_);
+  }
 }
 
 void Session::SignIn(Receiver* receiver, SetupListener* listener) {
@@ -139,14 +172,17 @@ void Session::Save() {
     throw Failure(
         "there is no folder for settings to keep this in: name one with --settings FOLDER");
   }
-  FileState const before(FileInSettings("Ostinet.xml"));
+  if (!damage_.empty()) {
+    throw Failure("nothing is saved over a studio that cannot be read: mend or remove the file");
+  }
+  FileState const before(FileInSettings(kStudioFile));
   GetSetup().SetListener(nullptr);
   GetSetup().SignOut(true);
   FailIfSettingsFailed();
   // The library saves without a word, so what it left behind has to tell.
-  if (before == FileState(FileInSettings("Ostinet.xml"))) {
+  if (before == FileState(FileInSettings(kStudioFile))) {
     throw Failure("the studio could not be saved in \"" +
-                  FileInSettings("Ostinet.xml").GetFullPath().string() + "\"; it is as it was");
+                  FileInSettings(kStudioFile).GetFullPath().string() + "\"; it is as it was");
   }
   virtualEndpoints_.Save(FileInSettings(kVirtualEndpointsFile));
 }

@@ -53,11 +53,13 @@ class Session : private Noncopyable<Session> {
   void SignIn(Receiver* receiver, SetupListener* listener);
   File FileInSettings(char const* name) const;
   void FailIfSettingsFailed() const;
+  void LookForDamage();
 
   std::unique_ptr<FolderPrefs> prefs_;
   PollLoop loop_;
   HostCallbacks callbacks_;
   VirtualEndpoints virtualEndpoints_;
+  std::string damage_;  // a sentence, where the studio's file cannot be read to its end
 };
 
 /// When a command that listens ends by itself.

@@ -4,6 +4,7 @@
 #include <CLI/CLI.hpp>
 
 #include "JsonText.h"
+#include "Lookup.h"
 #include "Output.h"
 
 namespace Ostinet::Tool {
@@ -39,6 +40,29 @@ void TakeOffPorts(Entity const& entity) {
   for (int i = 0; i < entity.CountDestinations(); ++i) {
     Destination const destination = entity.GetDestination(i);
     destination.GetDirectDestination().RemoveConnectedDestination(destination);
+  }
+}
+
+PortsInUse PortsOf(Device const& device) {
+  PortsInUse ports;
+  for (Entity const& entity : EntitiesOf(device)) {
+    for (int i = 0; i < entity.CountSources(); ++i) {
+      ports.sources.push_back(entity.GetSource(i).GetDirectSource());
+    }
+    for (int i = 0; i < entity.CountDestinations(); ++i) {
+      ports.destinations.push_back(entity.GetDestination(i).GetDirectDestination());
+    }
+  }
+  return ports;
+}
+
+// Taking nothing off a port writes its list.
+void ListAnew(PortsInUse const& ports) {
+  for (Source const& port : ports.sources) {
+    port.RemoveConnectedSource(Source::kNoSource);
+  }
+  for (Destination const& port : ports.destinations) {
+    port.RemoveConnectedDestination(Destination::kNoDestination);
   }
 }
 

@@ -26,8 +26,11 @@ void New(GlobalOptions const& globals, VirtualOptions const& options) {
 
 void Delete(GlobalOptions const& globals, VirtualOptions const& options) {
   Session session(globals, nullptr, nullptr);
-  session.GetVirtualEndpoints().Remove(session.GetSetup(), options.name);
+  Endpoint const gone = session.GetVirtualEndpoints().Find(options.name);
+  NamedObject const told = Named(gone);
+  session.GetVirtualEndpoints().Remove(session.GetSetup(), gone);
   session.Save();
+  PrintNamed(globals, told);
 }
 
 }  // namespace

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "VirtualEndpoints.h"
 
+#include <algorithm>
 #include <utility>
 
 #include "Errors.h"
@@ -93,14 +94,19 @@ Endpoint VirtualEndpoints::Add(Setup& setup, UString const& name, Setup::SrcOrDe
   return shown;
 }
 
-void VirtualEndpoints::Remove(Setup& setup, std::string const& name) {
+Endpoint VirtualEndpoints::Find(std::string const& name) const {
   std::vector<Endpoint> shown;
   for (Pair const& pair : pairs_) {
     shown.push_back(pair.shown);
   }
-  auto const place = MatchName(CandidatesOf(shown), name, "virtual endpoint");
-  setup.DeleteVirtualEndpoint(shown[place]);
-  pairs_.erase(pairs_.begin() + static_cast<std::ptrdiff_t>(place));
+  return Tool::Find(shown, name, "virtual endpoint");
+}
+
+void VirtualEndpoints::Remove(Setup& setup, Endpoint const& shown) {
+  setup.DeleteVirtualEndpoint(shown);
+  pairs_.erase(std::remove_if(pairs_.begin(), pairs_.end(),
+                              [&](Pair const& pair) { return pair.shown == shown; }),
+               pairs_.end());
   isEdited_ = true;
 }
 

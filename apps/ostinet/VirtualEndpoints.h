@@ -31,8 +31,10 @@ class VirtualEndpoints {
 
   /// Makes a new pair and keeps it; gives the end that shows.
   Endpoint Add(Setup& setup, UString const& name, Setup::SrcOrDest publicEnd);
-  /// Deletes one of them, named as endpoints are, and forgets it; throws Failure.
-  void Remove(Setup& setup, std::string const& name);
+  /// The end that shows of one of them, named as endpoints are; throws Failure.
+  Endpoint Find(std::string const& name) const;
+  /// Deletes the pair whose end that is, and forgets it.
+  void Remove(Setup& setup, Endpoint const& shown);
 
  private:
   struct Pair {

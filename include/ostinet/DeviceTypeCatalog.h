@@ -138,8 +138,9 @@ struct DeviceTypeFileCheck {
 };
 
 /// Reads a file as the catalog does and tells what of it is passed over: unknown elements and
-/// attributes, values out of range, a second type of one model, pictures that are not installed,
-/// what stands behind a fault of the XML. Throws nothing, also for a file that cannot be opened.
+/// attributes, values out of range, a second type of one model, names that new devices do not get,
+/// pictures that are not installed, what stands behind a fault of the XML. Throws nothing, also for
+/// a file that cannot be opened.
 OSTINET_EXPORT DeviceTypeFileCheck CheckDeviceTypeFile(File const& file);
 
 namespace Impl {

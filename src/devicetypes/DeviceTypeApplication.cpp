@@ -83,4 +83,19 @@ void NamePorts(DeviceTypePortGroup const& group, EntityImpl const& entity) {
   NameEach(entity.GetDestinations(), group.ins);
 }
 
+// The input that stands where the entity stands among the groups says for all inputs of the entity
+// whether they are named. Device type files are written around this, and hosts find what they
+// stored by the names that came of it. An entity that stands behind its inputs' end has no such
+// input, so there each says it for itself.
+void NameNewPorts(DeviceTypePortGroup const& group, std::size_t index, EntityImpl const& entity) {
+  NameEach(entity.GetSources(), group.outs);
+  if (index >= group.ins.size()) {
+    NameEach(entity.GetDestinations(), group.ins);
+  } else if (!group.ins[index].empty()) {
+    for (std::size_t i = 0; i < entity.GetDestinations().size(); ++i) {
+      entity.GetDestinations()[i]->SetName(group.ins[i]);
+    }
+  }
+}
+
 }  // namespace Ostinet::Impl

@@ -23,7 +23,11 @@ std::vector<DeviceTypePortGroup> PortGroupsOf(DeviceTypeInfoImpl const* type);
 /// What the entity of the group at `index` is called: "Port 1" for the first if it has no name.
 UString EntityNameOf(DeviceTypePortGroup const& group, std::size_t index);
 
-/// Gives the entity's ports the names that the group has for them.
+/// Gives the entity's ports the names that the group has for them; nameless ones keep theirs.
 void NamePorts(DeviceTypePortGroup const& group, EntityImpl const& entity);
+
+/// The same for the entity at `index` of a new device, which has the group's number of ports. Its
+/// destinations are named all or none: by whether the group's input at `index` has a name.
+void NameNewPorts(DeviceTypePortGroup const& group, std::size_t index, EntityImpl const& entity);
 
 }  // namespace Ostinet::Impl

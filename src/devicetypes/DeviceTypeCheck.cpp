@@ -38,6 +38,25 @@ DeviceTypeFileNote NoteOfFault() {
           "nothing is read from here on: " + UString(fault.Text().substr(end + 2))};
 }
 
+UString Numbered(char const* thing, std::size_t index) {
+  UString text;
+  text.Stream() << thing << " " << static_cast<unsigned long>(index + 1);
+  return text;
+}
+
+// A new device names all inputs of a group or none, as one of them says.
+void CheckInputNames(Impl::DeviceTypeInfoImpl const& type, int line, DeviceTypeFileCheck& check) {
+  for (std::size_t i = 0; i < type.portGroups.size(); ++i) {
+    auto const& names = type.portGroups[i].ins;
+    bool const isAnyNamed =
+        std::any_of(names.begin(), names.end(), [](UString const& name) { return !name.empty(); });
+    if (isAnyNamed && i < names.size() && names[i].empty()) {
+      check.notes.push_back({line, Numbered("input", i) + " of " + Numbered("port group", i) +
+                                       " has no name: new devices skip those of the others, too"});
+    }
+  }
+}
+
 // What only the whole file tells.
 void CheckTypes(Impl::DevTypeFileReader const& reader, DeviceTypeFileCheck& check) {
   for (std::size_t i = 0; i < reader.Types().size(); ++i) {
@@ -49,6 +68,7 @@ void CheckTypes(Impl::DevTypeFileReader const& reader, DeviceTypeFileCheck& chec
       continue;
     }
     check.types.push_back(DeviceTypeInfo(reader.Types()[i]));
+    CheckInputNames(type, reader.Lines()[i], check);
     if (!type.image.empty() && !IsInstalled(type.image)) {
       check.notes.push_back({reader.Lines()[i], "the picture \"" + type.image +
                                                     "\" is not in the machine's folder of device "

@@ -45,7 +45,7 @@ RCPtrMT<DeviceImpl> WinMIDISetup::PlatformCreateDevice(DeviceTypeInfoImpl* type,
     auto const entity =
         PlatformCreateEntity(device, EntityNameOf(group, i), static_cast<int>(group.outs.size()),
                              static_cast<int>(group.ins.size()));
-    NamePorts(group, *entity);
+    NameNewPorts(group, i, *entity);
   }
   return device;
 }

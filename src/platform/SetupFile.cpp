@@ -12,10 +12,12 @@ namespace Ostinet::Impl {
 
 namespace {
 
-File SetupFileIn(PrefsHandler& prefs) {
+UString const kSetupFileName("Ostinet.xml");
+
+Folder FolderOf(PrefsHandler& prefs) {
   Folder folder;
   prefs.GetFolder(folder);
-  return folder.GetFile(UString("Ostinet.xml"));
+  return folder;
 }
 
 template <class Object>
@@ -43,7 +45,7 @@ void LoadSetupFile(WinMIDISetup& setup) {
     return;
   }
   try {
-    XMLLib::Parser parser(SetupFileIn(*prefs));
+    XMLLib::Parser parser(FolderOf(*prefs).GetFile(kSetupFileName));
     SetupFileReader(setup, parser, SetupFileReader::kLoad).ReadStudio();
   } catch (...) {
     // What was read by then stays.
@@ -57,7 +59,8 @@ void SaveSetupFile(WinMIDISetup& setup) {
   }
   try {
     Studio const& studio = setup.Lists();
-    XMLLib::Writer writer(SetupFileIn(*prefs));
+    // A host's first save makes the folder too.
+    XMLLib::Writer writer(FolderOf(*prefs).DemandFileInFolder(kSetupFileName, 0, 0));
     writer.StartElement(kSetupFileRoot);
     WriteBarePorts(writer, XMLNames::kSource, studio.sources);
     WriteBarePorts(writer, XMLNames::kDestination, studio.destinations);

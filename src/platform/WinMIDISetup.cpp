@@ -268,7 +268,9 @@ void WinMIDISetup::DrainVirtualSources() {
   auto sources = CopyForDrain(virtualSources_);
   virtualSourcesMutex_.unlock();
   for (auto const& source : sources) {
-    if (auto const* const peer = dynamic_cast<WinMIDIVirtSource const*>(source->Peer())) {
+    // One that a receiver has deleted meanwhile is silent: its own receiver may be gone as well.
+    auto const* const peer = dynamic_cast<WinMIDIVirtSource const*>(source->Peer());
+    if (peer != nullptr && peer->Exists()) {
       std::shared_ptr<PacketQueue> const queue = peer->Queue();
       queue->Drain(GetReceiver(), Source(source), true);
     }

@@ -100,6 +100,14 @@ TEST_F(CheckingTypes, TellsATypeWithoutMakerOrModel) {
                           "3: a type without \"Model\" is skipped with all that is in it"));
 }
 
+TEST_F(CheckingTypes, TellsNamesOfInputsThatNewDevicesDoNotGet) {
+  std::string const some = "<MIDIPortGroup><MIDIIn Name='A'/><MIDIIn/></MIDIPortGroup>";
+  std::string const none = "<MIDIPortGroup><MIDIIn/><MIDIIn/></MIDIPortGroup>";
+  EXPECT_THAT(NotesInType(some + some + some + none),
+              ElementsAre("2: input 2 of port group 2 has no name: new devices skip those of the "
+                          "others, too"));
+}
+
 TEST_F(CheckingTypes, TellsAPictureThatIsNotInstalled) {
   std::string const text = TypesFile(TypeElement("Acme", "Synth", "", "Image='synth.png'"));
   EXPECT_THAT(Notes(text), ElementsAre(HasSubstr("the picture \"synth.png\" is not in")));

@@ -2,6 +2,7 @@
 #include "devicetypes/DeviceTypeInfoImpl.h"
 #include "model/Handles.h"
 #include "model/PropertyKeys.h"
+#include "ostinet/Autodetect.h"
 #include "platform/PlatformTest.h"
 
 namespace Ostinet::Testing {
@@ -36,6 +37,13 @@ class DeviceTypes : public PlatformTest {
     }
     return names;
   }
+  static std::vector<std::string> DestinationNames(Entity const& entity) {
+    std::vector<std::string> names;
+    for (int i = 0; i < entity.CountDestinations(); ++i) {
+      names.push_back(entity.GetDestination(i).GetRawName().string());
+    }
+    return names;
+  }
 };
 
 TEST_F(DeviceTypes, ANewDeviceGetsTheFactsButNeitherMakerNorModel) {
@@ -55,16 +63,52 @@ TEST_F(DeviceTypes, ANewDeviceGetsTheFactsButNeitherMakerNorModel) {
 
 TEST_F(DeviceTypes, ANewDeviceHasTheEntitiesOfItsType) {
   DeviceTypeInfo const type = TypeOf(1);
-  type.GetImplPtr()->portGroups.push_back({"Main", {"In A", "", "In C"}, {}});
+  type.GetImplPtr()->portGroups.push_back({"Main", {"In A", "In B"}, {}});
+  type.GetImplPtr()->portGroups.push_back({"Out", {}, {"Out A", "", "Out C"}});
   Device const device = setup.CreateDevice(type, "Lead");
-  EXPECT_THAT(EntityNames(device), ElementsAre("Port 1", "Main"));
+  EXPECT_THAT(EntityNames(device), ElementsAre("Port 1", "Main", "Out"));
   Entity const main = device.GetEntity(1);
   EXPECT_EQ(main.CountSources(), 0);
-  ASSERT_EQ(main.CountDestinations(), 3);
-  EXPECT_EQ(main.GetDestination(0).GetRawName(), UString("In A"));
-  EXPECT_EQ(main.GetDestination(2).GetRawName(), UString("In C"));
+  EXPECT_THAT(DestinationNames(main), ElementsAre("In A", "In B"));
+  Entity const out = device.GetEntity(2);
+  EXPECT_EQ(out.CountDestinations(), 0);
+  ASSERT_EQ(out.CountSources(), 3);
+  EXPECT_EQ(out.GetSource(0).GetRawName(), UString("Out A"));
+  EXPECT_EQ(out.GetSource(2).GetRawName(), UString("Out C"));
   // The nameless one has the name that its entity gave it.
-  EXPECT_EQ(main.GetDestination(1).GetRawName(), UString("Main"));
+  EXPECT_EQ(out.GetSource(1).GetRawName(), UString("Out"));
+}
+
+// Type files are written around this, so it must stay as it is: the input at the entity's own place
+// among the entities says for all of them whether they take their names.
+TEST_F(DeviceTypes, OneInputOfANewEntitySaysForAllWhetherTheyAreNamed) {
+  DeviceTypeInfo const type = TypeOf(0);
+  type.GetImplPtr()->portGroups = {{"First", {"", "In B"}, {}},
+                                   {"Second", {"", "In B", "In C"}, {}},
+                                   {"Third", {"In A", "In B", ""}, {}}};
+  Device const device = setup.CreateDevice(type, "Lead");
+  EXPECT_THAT(DestinationNames(device.GetEntity(0)), ElementsAre("First", "First"));
+  // Where it has a name, those without one become nameless.
+  EXPECT_THAT(DestinationNames(device.GetEntity(1)), ElementsAre("", "In B", "In C"));
+  EXPECT_THAT(DestinationNames(device.GetEntity(2)), ElementsAre("Third", "Third", "Third"));
+}
+
+TEST_F(DeviceTypes, WithoutAnInputAtThePlaceOfTheEntityEachSaysItForItself) {
+  DeviceTypeInfo const type = TypeOf(1);
+  type.GetImplPtr()->portGroups.push_back({"Second", {"In A"}, {}});
+  type.GetImplPtr()->portGroups.push_back({"Third", {"", "In B"}, {}});
+  Device const device = setup.CreateDevice(type, "Lead");
+  EXPECT_THAT(DestinationNames(device.GetEntity(1)), ElementsAre("In A"));
+  EXPECT_THAT(DestinationNames(device.GetEntity(2)), ElementsAre("Third", "In B"));
+}
+
+TEST_F(DeviceTypes, ADeviceThatIsMadeOverNamesEachInputByItself) {
+  Device const device = setup.CreateDevice(TypeOf(1), "Lead");
+  DeviceTypeInfo const type = TypeOf(0);
+  type.GetImplPtr()->portGroups = {{"First", {"", "In B"}, {}}, {"Second", {"In A", ""}, {}}};
+  setup.ChangeDeviceType(device, type);
+  EXPECT_THAT(DestinationNames(device.GetEntity(0)), ElementsAre("First", "In B"));
+  EXPECT_THAT(DestinationNames(device.GetEntity(1)), ElementsAre("In A", "Second"));
 }
 
 TEST_F(DeviceTypes, ANewDeviceWithoutTypeOrPortsHasOnePair) {
@@ -111,6 +155,21 @@ TEST_F(DeviceTypes, TheListenerHearsOfTheChange) {
   setup.ChangeDeviceType(device, TypeOf(1));
   setup.PollSetupChanges();
   EXPECT_EQ(listener.setupChanges, before + 1);
+}
+
+TEST_F(DeviceTypes, AQuestionWithoutATimeIsStampedWithThePresent) {
+  Autodetect::Request const inquiry = DeviceTypeCatalog::Instance().GetAutodetectRequest(0);
+  auto const before = CurrentMIDITime().Value();
+  DataBuffer const sweep = inquiry.GetMessageW(kNoTimeStamp);
+  auto const after = CurrentMIDITime().Value();
+  ASSERT_GT(before, 0u);
+  ASSERT_FALSE(sweep.empty());
+  auto const stamp = sweep[0].stamp.AsMIDITime().Value();
+  EXPECT_GE(stamp, before);
+  EXPECT_LE(stamp, after);
+  for (std::size_t i = 0; i < sweep.size(); ++i) {
+    EXPECT_EQ(sweep[i].stamp.AsMIDITime().Value(), stamp);
+  }
 }
 
 TEST_F(DeviceTypes, AnEmptyTypeChangesNothing) {

@@ -420,6 +420,46 @@ TEST_F(VirtualPair, AReceiverMayMakeAndDeletePairs) {
   EXPECT_THAT(SourceNames(), ElementsAre("Next"));
 }
 
+// What it was to hear may be gone with it.
+TEST_F(VirtualPair, APairThatAReceiverDeletedIsSilent) {
+  auto const other =
+      setup.CreateVirtualEndpoint(UString("Other"), Setup::kSourceEnd, Setup::kSourceEnd);
+  auto gone = std::make_unique<TestReceiver>();
+  other.first.setDirectReceiver(gone.get());
+  receiver.onPacket = [&](Bytes const&) {
+    setup.DeleteVirtualEndpoint(other.first);
+    gone.reset();
+  };
+  Send(destination, {0x90, 1, 1});
+  Send(other.second, {0x90, 2, 2});
+  setup.ProcessInput();
+  EXPECT_EQ(receiver.packets.size(), 1u);
+}
+
+TEST_F(VirtualPair, MadeAnewFromItsReferenceHasItsIDWhereThatIsFree) {
+  for (Setup::SrcOrDest const end : {Setup::kSourceEnd, Setup::kDestinationEnd}) {
+    auto const shown = [end](std::pair<Source, Destination> const& pair) {
+      return end == Setup::kSourceEnd ? Endpoint(pair.first) : Endpoint(pair.second);
+    };
+    Endpoint const first = shown(setup.CreateVirtualEndpoint(UString("Mine"), end, end));
+    MatchData const reference = first.GetMatchData();
+    int const id = first.GetUniqueID();
+    Endpoint const twin = shown(setup.CreateVirtualEndpoint(reference, end, end));
+    EXPECT_EQ(twin.GetName(), UString("Mine"));
+    EXPECT_NE(twin.GetUniqueID(), id);
+    EXPECT_NE(twin.GetUniqueID(), 0);
+    setup.DeleteVirtualEndpoint(first);
+    setup.DeleteVirtualEndpoint(twin);
+    Endpoint const again = shown(setup.CreateVirtualEndpoint(reference, end, end));
+    EXPECT_EQ(again.GetUniqueID(), id);
+    setup.DeleteVirtualEndpoint(again);
+    // An ID belongs to the end that shows.
+    auto const hidden = setup.CreateVirtualEndpoint(reference, Setup::kNeitherEnd, end);
+    EXPECT_NE(hidden.first.GetUniqueID(), id);
+    EXPECT_NE(hidden.second.GetUniqueID(), id);
+  }
+}
+
 TEST_F(VirtualPair, WithoutAReceiverIsDropped) {
   SignOut();
   setup.SignIn(UString("Test"), nullptr, nullptr);

@@ -5,6 +5,7 @@
 #include <fstream>
 #include <iterator>
 #include <map>
+#include <regex>
 
 #include "core/AtomicFile.h"
 #include "platform/PlatformTest.h"
@@ -89,6 +90,70 @@ TEST_F(SetupFile, EndpointsOfAnEntityMayStandInAnyOrder) {
   EXPECT_EQ(entity.GetSource(0).GetUniqueID(), 13);
 }
 
+// The search for the properties passes over what comes first.
+TEST_F(SetupFile, PropertiesStandInFront) {
+  std::string const entity = "<Entity direct=\"false\">" + Properties("Port", 11) + "</Entity>";
+  WriteWhole("<Device direct=\"false\">" + entity + Properties("Synth", 10) + entity + "</Device>" +
+             "<Device direct=\"false\">" + entity + "</Device>");
+  SignIn();
+  ASSERT_EQ(setup.CountDevices(), 2);
+  EXPECT_EQ(setup.GetDevice(0).GetName(), UString("Synth"));
+  EXPECT_EQ(setup.GetDevice(0).CountEntities(), 1);
+  EXPECT_EQ(setup.GetDevice(1).CountEntities(), 0);
+}
+
+// Other programs read the file, so its form is part of what is promised.
+TEST_F(SetupFile, IsOfThisForm) {
+  AddOut("Out");
+  SignIn();
+  Device const device = setup.CreateDevice(UString("Synth"));
+  Dest("Out").AddConnectedDestination(device.GetEntity(0).GetDestination(0));
+  Dest("Out").SetManufacturer(UString("Acme"));
+  std::string const port = ">" + std::to_string(Dest("Out").GetUniqueID()) + "<";
+  std::string const synth = ">" + std::to_string(device._get_impl_id()) + "<";
+  SignOut(true);
+  std::string const named = std::regex_replace(Read(), std::regex(port), ">PORT<");
+  EXPECT_EQ(std::regex_replace(named, std::regex(synth), ">SYNTH<"),
+            R"(<?xml version="1.0" encoding="UTF-8"?>
+<Ostinet>
+  <Destination direct="true" software="false" fake="false">
+    <Properties>
+      <IntList key="connUniqueID">
+        <IntItem>SYNTH</IntItem>
+      </IntList>
+      <String key="manufacturer">Acme</String>
+      <String key="name">Out</String>
+      <Int key="offline">0</Int>
+      <Int key="uniqueID">PORT</Int>
+      <Int key="which API">2</Int>
+    </Properties>
+  </Destination>
+  <Device direct="false" fake="false">
+    <Properties>
+      <String key="name">Synth</String>
+      <Int key="uniqueID">SYNTH</Int>
+    </Properties>
+    <Entity direct="false" fake="false">
+      <Properties>
+        <String key="name">Port 1</String>
+      </Properties>
+      <Source direct="false" software="false" fake="false">
+        <Properties/>
+      </Source>
+      <Destination direct="false" software="false" fake="false">
+        <Properties>
+          <IntList key="connUniqueID">
+            <IntItem>PORT</IntItem>
+          </IntList>
+        </Properties>
+        <Connection name="Out" manufacturer="Acme" model=""/>
+      </Destination>
+    </Entity>
+  </Device>
+</Ostinet>
+)");
+}
+
 TEST_F(SetupFile, SavingAndLoadingTwiceGivesTheSame) {
   AddOut("Out");
   AddIn("In");
@@ -133,6 +198,18 @@ TEST_F(SetupFile, AFolderThatIsGoneLosesTheSaveAndNothingElse) {
   std::filesystem::remove_all(prefs.folder);
   SignIn();
   EXPECT_THAT(DestNames(), ElementsAre("Out"));
+}
+
+// A host that never ran before has no folder for its settings yet.
+TEST_F(SetupFile, TheFirstSaveMakesTheFolder) {
+  std::filesystem::path const parent = prefs.folder;
+  prefs.folder = parent / "settings" / "of a host";
+  AddOut("Out");
+  SignIn();
+  EXPECT_FALSE(std::filesystem::exists(parent / "settings")) << "a load makes nothing";
+  SignOut(true);
+  EXPECT_NE(Read().find("Out"), std::string::npos);
+  prefs.folder = parent;
 }
 
 // Each write fails once, as on a full disk; the studio in the file is never lost.

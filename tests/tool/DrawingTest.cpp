@@ -208,6 +208,17 @@ TEST(DrawingSVG, CutsANameBetweenLettersWhereItDoesNotFit) {
       texts, testing::Contains(testing::AnyOf(testing::EndsWith("本…"), testing::EndsWith("日…"))));
 }
 
+TEST(DrawingSVG, SquareLettersTakeTheRoomOfTwo) {
+  StudioView studio = SomeStudio();
+  studio.devices[0].name = "日本語の名前日本語の名前日本語の名前";  // 18
+  std::vector<std::string> texts = TextsOf(DrawingSVG(LayOut(studio)));
+  EXPECT_THAT(texts, testing::Contains(testing::EndsWith("…")));
+  studio.devices[0].name = "eighteen letters..";
+  texts = TextsOf(DrawingSVG(LayOut(studio)));
+  EXPECT_THAT(texts, testing::Contains("eighteen letters.."));
+  EXPECT_THAT(texts, testing::Not(testing::Contains(testing::EndsWith("…"))));
+}
+
 TEST(DrawingSVG, OfAnEmptyStudioSaysSo) {
   std::vector<std::string> const texts = TextsOf(DrawingSVG(LayOut(StudioView())));
   EXPECT_THAT(texts, testing::Contains("NO PORTS"));

@@ -75,7 +75,8 @@ TEST_F(EditCommands, ADeviceIsMadeKeptAndDeleted) {
   ASSERT_EQ(device["entities"].size(), 1u);
   EXPECT_EQ(device["entities"][0]["sources"].size(), 1u);
   EXPECT_EQ(device["entities"][0]["destinations"].size(), 1u);
-  Do({"device", "delete", "syn"});
+  // A part of a name is enough, so what went is told.
+  EXPECT_EQ(Do({"device", "delete", "syn"}).out, made.out);
   EXPECT_TRUE(List()["devices"].empty());
 }
 
@@ -240,7 +241,7 @@ TEST_F(EditCommands, EntitiesComeAndGo) {
   ASSERT_EQ(entities.size(), 2u);
   EXPECT_EQ(entities[1]["sources"].size(), 0u);
   EXPECT_EQ(entities[1]["destinations"].size(), 2u);
-  Do({"entity", "delete", "Rack", "Port 2"});
+  EXPECT_EQ(Do({"entity", "delete", "Rack", "Port 2"}).out, made.out);
   EXPECT_EQ(FirstDevice()["entities"].size(), 1u);
   Fails({"entity", "new", "Nobody", "Port"});
 }
@@ -317,6 +318,20 @@ TEST_F(EditCommands, ADeletedDeviceLeavesNoNumberWithItsPort) {
   EXPECT_THAT(ReadFile("Ostinet.xml"), Not(HasSubstr("IntItem")));
 }
 
+// Else the first end, which bears the same number, could not be taken off its port any more.
+TEST_F(EditCommands, ATypeWithFewerEndsLeavesNoNumberWithTheirPorts) {
+  Do({"device", "new", "Lead", "Access", "Virus TI"});
+  auto const entities = FirstDevice()["entities"];
+  ASSERT_EQ(entities.size(), 2u);
+  Do({"connect", entities[0]["sources"][0]["name"], "Desk 1"});
+  Do({"connect", entities[1]["sources"][0]["name"], "Desk 2"});
+  Do({"device", "type", "Lead", "Roland", "JD-Xi"});
+  EXPECT_EQ(FirstDevice()["entities"][0]["sources"][0]["port"], "Desk 1");
+  EXPECT_EQ(FirstDevice()["entities"][0]["destinations"][0]["port"], "Desk 1");
+  Do({"disconnect", "Lead"});
+  EXPECT_THAT(ReadFile("Ostinet.xml"), Not(HasSubstr("IntItem")));
+}
+
 TEST_F(EditCommands, AVirtualEndpointIsThereInEveryRunUntilItIsDeleted) {
   auto const made = json::parse(Do({"virtual", "new", "Loop", "--json"}).out);
   EXPECT_EQ(made["name"], "Loop");
@@ -330,7 +345,7 @@ TEST_F(EditCommands, AVirtualEndpointIsThereInEveryRunUntilItIsDeleted) {
   ToolRun const heard =
       Do({"monitor", "Loop", "--hex", "--count", "1", "--send", "Loop: 90 3C 40"});
   EXPECT_THAT(heard.out, HasSubstr("90 3C 40"));
-  Do({"virtual", "delete", "loop"});
+  EXPECT_EQ(json::parse(Do({"virtual", "delete", "loop", "--json"}).out), made);
   EXPECT_THAT(List()["sources"].dump(), Not(HasSubstr("Loop")));
 }
 
@@ -350,6 +365,24 @@ TEST_F(EditCommands, AFileOfVirtualEndpointsThatIsDamagedIsKeptAndTold) {
     std::ofstream(SettingsFile("virtual.json"), std::ios::binary) << damage;
     EXPECT_THAT(Fails({"virtual", "new", "Other"}), HasSubstr("virtual.json"));
   }
+}
+
+TEST_F(EditCommands, AStudioThatCannotBeReadIsKeptAndTold) {
+  Do({"device", "new", "Synth"});
+  std::string const whole = ReadFile("Ostinet.xml");
+  for (std::string const& damaged : {whole.substr(0, whole.size() - 5), std::string("<Other/>")}) {
+    std::ofstream(SettingsFile("Ostinet.xml"), std::ios::binary) << damaged;
+    ToolRun const edit = Tool({"device", "new", "Other"});
+    EXPECT_EQ(edit.exitCode, kFailed);
+    EXPECT_EQ(edit.out, "");
+    EXPECT_THAT(edit.err, HasSubstr("nothing is saved over a studio that cannot be read"));
+    EXPECT_EQ(Kept(), damaged);
+    ToolRun const look = Tool({"list"});
+    EXPECT_EQ(look.exitCode, kDone);
+    EXPECT_THAT(look.err, HasSubstr("Ostinet.xml\" cannot be read to its end: "));
+  }
+  std::ofstream(SettingsFile("Ostinet.xml"), std::ios::binary) << "";
+  Do({"device", "new", "Synth"});
 }
 
 // A folder where the file should be: nothing can be renamed over it.

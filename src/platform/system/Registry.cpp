@@ -5,11 +5,11 @@
 
 #include "platform/system/Registry.h"
 
-#include <cstdlib>
 #include <mutex>
 #include <string>
 #include <utility>
 
+#include "ostinet/core/Environment.h"
 #include "ostinet/core/Error.h"
 #include "platform/system/MachineSystem.h"
 #include "platform/system/System.h"
@@ -55,7 +55,9 @@ std::shared_ptr<System> const& CurrentSystem() {
   Choice& choice = TheChoice();
   std::lock_guard lock(choice.mutex);
   if (choice.installed != nullptr) return choice.installed;
-  if (choice.automatic == nullptr) choice.automatic = ChooseSystem(std::getenv("OSTINET_STUDIO"));
+  if (choice.automatic == nullptr) {
+    choice.automatic = ChooseSystem(EnvironmentText("OSTINET_STUDIO").string().c_str());
+  }
   return choice.automatic;
 }
 
