@@ -8,12 +8,13 @@
 namespace Ostinet::Tool {
 namespace {
 
-template <class Handle>
+/// `where` tells handles of one name apart.
+template <class Handle, class Where>
 Handle FindByName(std::vector<Handle> const& handles, std::string const& name,
-                  std::string const& kind) {
+                  std::string const& kind, Where const& where) {
   std::vector<Candidate> candidates;
   for (Handle const& handle : handles) {
-    candidates.push_back({handle.GetName().string(), 0});
+    candidates.push_back({handle.GetName().string(), 0, where(handle)});
   }
   return handles[MatchName(candidates, name, kind)];
 }
@@ -58,6 +59,17 @@ short ChannelOf(int channel) {
   return static_cast<short>(channel - 1);
 }
 
+void FailIfNothingIsKept(Destination const& destination) {
+  std::string const name = "\"" + destination.GetName().string() + "\"";
+  if (destination.IsSoftware()) {
+    throw Failure("what is chosen for " + name +
+                  " cannot be kept: it is made by software, which no studio's file holds");
+  }
+  if (destination.IsInterface().get_value_or(false)) {
+    throw Failure(name + " has no names of its own: the instruments that hang on it have");
+  }
+}
+
 DestinationNameSet NameSetOf(Destination const& destination, short channel) {
   DestinationNameSet const nameSet = destination.GetCurrentNameSet(channel);
   if (nameSet.GetImplPtr() == nullptr) {
@@ -76,7 +88,8 @@ std::vector<DestinationMode> ModesOf(Destination const& destination) {
 }
 
 DestinationMode FindMode(Destination const& destination, std::string const& name) {
-  return FindByName(ModesOf(destination), name, "mode");
+  return FindByName(ModesOf(destination), name, "mode",
+                    [](DestinationMode const&) { return std::string(); });
 }
 
 std::vector<PatchBank> BanksOf(DestinationNameSet const& nameSet) {
@@ -87,8 +100,26 @@ std::vector<PatchBank> BanksOf(DestinationNameSet const& nameSet) {
   return banks;
 }
 
+std::string BankNumbersText(PatchBank const& bank) {
+  constexpr unsigned char kNone = 255;
+  auto const half = [](unsigned char number) {
+    return number != kNone ? std::to_string(number) : std::string("-");
+  };
+  bool const hasNone =
+      bank.GetController0Number() == kNone && bank.GetController32Number() == kNone;
+  return hasNone ? std::string()
+                 : half(bank.GetController0Number()) + "/" + half(bank.GetController32Number());
+}
+
 PatchBank FindBank(DestinationNameSet const& nameSet, std::string const& name) {
-  return FindByName(BanksOf(nameSet), name, "bank");
+  std::vector<PatchBank> const banks = BanksOf(nameSet);
+  std::vector<PatchBank> numbered;
+  for (PatchBank const& bank : banks) {
+    if (!name.empty() && BankNumbersText(bank) == name) {
+      numbered.push_back(bank);
+    }
+  }
+  return numbered.size() == 1 ? numbered.front() : FindByName(banks, name, "bank", BankNumbersText);
 }
 
 std::vector<Patch> PatchesOf(PatchBank const& bank) {
@@ -109,7 +140,8 @@ Patch FindPatch(DestinationNameSet const& nameSet, std::string const& wanted,
   if (!numbered.empty()) {
     throw Failure("several banks have a patch " + wanted + ": name one with --bank");
   }
-  return FindByName(patches, wanted, "patch");
+  return FindByName(patches, wanted, "patch",
+                    [](Patch const& patch) { return patch.GetBank().GetName().string(); });
 }
 
 Patch FindPatchToShow(Destination const& destination, short channel, std::string const& wanted,
