@@ -68,7 +68,7 @@ void FailWithoutNames(Destination const& destination, std::string const& path) {
   std::string const maker = destination.GetManufacturer().string();
   std::string const model = destination.GetModel().string();
   throw Failure("\"" + path + "\" has no names for \"" + destination.GetName().string() + "\", " +
-                (maker.empty() && model.empty() ? "whose maker and model are not known"
+                (maker.empty() || model.empty() ? "whose maker and model are not known"
                                                 : "which is a " + maker + " " + model));
 }
 

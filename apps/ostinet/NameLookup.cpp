@@ -31,14 +31,27 @@ std::vector<Patch> AllPatchesOf(DestinationNameSet const& nameSet, std::string c
   return patches;
 }
 
-std::vector<Patch> WithNumber(std::vector<Patch> const& patches, UString const& number) {
-  std::vector<Patch> found;
+std::string WithoutLeadingZeros(std::string const& number) {
+  std::size_t const first = number.find_first_not_of('0');
+  return first != std::string::npos ? number.substr(first) : number.substr(number.size() - 1);
+}
+
+// Those of exactly this number, else those whose number differs in leading zeros alone.
+std::vector<Patch> WithNumber(std::vector<Patch> const& patches, std::string const& wanted) {
+  std::vector<Patch> exact;
+  std::vector<Patch> alike;
   for (Patch const& patch : patches) {
-    if (patch.GetNumber() == number) {
-      found.push_back(patch);
+    std::string const number = patch.GetNumber().string();
+    if (number.empty() || wanted.empty()) {
+      continue;
+    }
+    if (number == wanted) {
+      exact.push_back(patch);
+    } else if (WithoutLeadingZeros(number) == WithoutLeadingZeros(wanted)) {
+      alike.push_back(patch);
     }
   }
-  return found;
+  return exact.empty() ? alike : exact;
 }
 
 }  // namespace
@@ -73,8 +86,11 @@ void FailIfNothingIsKept(Destination const& destination) {
 DestinationNameSet NameSetOf(Destination const& destination, short channel) {
   DestinationNameSet const nameSet = destination.GetCurrentNameSet(channel);
   if (nameSet.GetImplPtr() == nullptr) {
+    bool const needsMode =
+        destination.CountModes() > 0 && destination.GetCurrentMode().GetImplPtr() == nullptr;
     throw Failure("\"" + destination.GetName().string() + "\" has no names on channel " +
-                  std::to_string(channel + 1));
+                  std::to_string(channel + 1) +
+                  (needsMode ? " before a mode is chosen with ostinet mode" : ""));
   }
   return nameSet;
 }
@@ -133,12 +149,13 @@ std::vector<Patch> PatchesOf(PatchBank const& bank) {
 Patch FindPatch(DestinationNameSet const& nameSet, std::string const& wanted,
                 std::string const& bank) {
   std::vector<Patch> const patches = AllPatchesOf(nameSet, bank);
-  std::vector<Patch> const numbered = WithNumber(patches, UString(wanted));
+  std::vector<Patch> const numbered = WithNumber(patches, wanted);
   if (numbered.size() == 1) {
     return numbered.front();
   }
   if (!numbered.empty()) {
-    throw Failure("several banks have a patch " + wanted + ": name one with --bank");
+    throw Failure(bank.empty() ? "several banks have a patch " + wanted + ": name one with --bank"
+                               : "the bank has several patches " + wanted + ": name one of them");
   }
   return FindByName(patches, wanted, "patch",
                     [](Patch const& patch) { return patch.GetBank().GetName().string(); });

@@ -101,6 +101,7 @@ TEST_F(NamesCommands, SelectAPatchByNumberOrName) {
   ToolRun const ambiguous = Do({"select", "Out 1", "1", "1"});
   EXPECT_EQ(ambiguous.exitCode, kFailed);
   EXPECT_THAT(ambiguous.err, HasSubstr("several banks have a patch 1"));
+  EXPECT_EQ(DoJSON({"select", "Out 1", "1", "001", "--bank", "B"})["name"], "Organ");
   EXPECT_EQ(Do({"select", "Out 1", "17", "Piano"}).exitCode, kUsage);
   EXPECT_EQ(Do({"select", "Out 1", "1", "Flute"}).exitCode, kFailed);
 }
@@ -109,6 +110,17 @@ TEST_F(NamesCommands, KeepAMode) {
   ChooseDocument();
   EXPECT_EQ(Do({"mode", "Out 1", "multi"}).exitCode, kDone);
   EXPECT_EQ(DoJSON({"names", "Out 1"})["mode"], "Multi");
+}
+
+// Other names have the old mode or not; none is guessed.
+TEST_F(NamesCommands, AskForAModeWhereTheStoredOneIsGone) {
+  ChooseDocument();
+  ASSERT_EQ(Do({"mode", "Out 1", "multi"}).exitCode, kDone);
+  ASSERT_EQ(Do({"names", "Out 1", "--standard", "General MIDI"}).exitCode, kDone);
+  EXPECT_TRUE(DoJSON({"names", "Out 1"})["mode"].is_null());
+  EXPECT_THAT(Do({"banks", "Out 1"}).err, HasSubstr("before a mode is chosen"));
+  ASSERT_EQ(Do({"mode", "Out 1", "General"}).exitCode, kDone);
+  EXPECT_EQ(Do({"banks", "Out 1"}).exitCode, kDone);
 }
 
 TEST_F(NamesCommands, KeepTheNameOfANote) {
