@@ -158,8 +158,8 @@ MatchData MatchTranslator::TranslateFromBrevia(BreviaDestinationMatch const& rec
 }
 
 BreviaDestinationMatch MatchTranslator::TranslateToBrevia(MatchData const& data, bool& isSource) {
-  BreviaDestinationMatch record;
-  std::memset(&record, 0, sizeof record);
+  BreviaDestinationMatch record{};
+  std::memset(&record, 0, sizeof record);  // its gaps too: hosts compare whole records
   record.kind = kNothing;
   MatchDataReader const reader(data);
   if (!reader.NamesEndpoint()) {

@@ -130,8 +130,10 @@ bool Endpoint::MatchOpposingNames(UString const& name1, UString const& name2, US
 bool Endpoint::MatchRelatedNames(UString const& name1, UString const& name2, UString& commonName,
                                  UString& rest1, UString& rest2) {
   // The outputs may be the names themselves.
+  // NOLINTBEGIN(performance-unnecessary-copy-initialization)
   std::u16string const text1 = name1.utf16_str();
   std::u16string const text2 = name2.utf16_str();
+  // NOLINTEND(performance-unnecessary-copy-initialization)
   commonName.clear();
   rest1.clear();
   rest2.clear();
