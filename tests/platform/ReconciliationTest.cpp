@@ -393,11 +393,10 @@ void ExpectListsAgree(Setup const& setup) {
   for (int i = 0; i < setup.CountEntities(); ++i) {
     ASSERT_EQ(entities.count(setup.GetEntity(i)), 1u);
   }
-  ASSERT_EQ(sources, InEntities<Source>(setup.CountSources(),
-                                        [&](int i) { return setup.GetSource(i); }));
-  ASSERT_EQ(destinations, InEntities<Destination>(setup.CountDestinations(), [&](int i) {
-              return setup.GetDestination(i);
-            }));
+  ASSERT_EQ(sources,
+            InEntities<Source>(setup.CountSources(), [&](int i) { return setup.GetSource(i); }));
+  ASSERT_EQ(destinations, InEntities<Destination>(setup.CountDestinations(),
+                                                  [&](int i) { return setup.GetDestination(i); }));
 }
 
 /// What must hold of a studio at any time.

@@ -1,6 +1,5 @@
 // SPDX-License-Identifier: MIT
 #include "ostinet/SystemPorts.h"
-
 #include "system/SimulatedTest.h"
 
 namespace Ostinet::Impl::Simulated {
@@ -33,9 +32,9 @@ TEST_F(SystemPorts, AreListedAsTheSystemHasThem) {
   studio_.AddPort(PortOf("Out", PortKind::kWinMMOut));
   studio_.AddPort(synth);
   studio_.AddPort(PortOf("Native In", PortKind::kDirectMusicIn));
-  EXPECT_EQ(Listed(), (std::vector<std::string>{"0 0 Old", "0 1 Out", "1 0 In",
-                                                "3 0 In [Emulated]", "2 1 Out [Emulated]",
-                                                "2 2 Synth", "3 3 Native In"}));
+  EXPECT_EQ(Listed(),
+            (std::vector<std::string>{"0 0 Old", "0 1 Out", "1 0 In", "3 0 In [Emulated]",
+                                      "2 1 Out [Emulated]", "2 2 Synth", "3 3 Native In"}));
   std::vector<SystemPort> const ports = ListSystemPorts();
   EXPECT_EQ(ports[0].technology, 4u);
   EXPECT_EQ(ports[1].technology, 1u);
