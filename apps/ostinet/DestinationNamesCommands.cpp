@@ -2,7 +2,9 @@
 //
 // `names` with a destination, and `names list`.
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <filesystem>
+#include <iterator>
 
 #include "Errors.h"
 #include "NameLookup.h"
@@ -35,14 +37,39 @@ Names DocumentAt(std::string const& path) {
   return Names(Names::kMasterNames, file);
 }
 
+// What the documents of this machine offer. One that cannot be read stops nothing.
+std::vector<NameDocumentOffer> AllOffers() {
+  std::vector<FileSpecification> unreadable;
+  std::vector<NameDocumentOffer> offers = ListNameDocuments(unreadable);
+  for (FileSpecification const& file : unreadable) {
+    Notify("\"" + file.GetFullPath().string() +
+           "\" cannot be read; ostinet names check tells where");
+  }
+  return offers;
+}
+
 Names StandardModeNamed(std::string const& name) {
   std::vector<Names> modes;
-  NamesCatalog::Instance().FindStandardModes(modes);
   std::vector<Candidate> candidates;
-  for (Names const& mode : modes) {
-    candidates.push_back({mode.GetName().string(), 0});
+  for (NameDocumentOffer const& offer : AllOffers()) {
+    if (offer.names.GetType() == Names::kStandardModeNames) {
+      modes.push_back(offer.names);
+      candidates.push_back({offer.names.GetName().string()});
+    }
   }
   return modes[MatchName(candidates, name, "standard mode")];
+}
+
+// A document is read for the maker and the model of the destination, whatever else it holds.
+void FailWithoutNames(Destination const& destination, std::string const& path) {
+  if (destination.CountModes() > 0) {
+    return;
+  }
+  std::string const maker = destination.GetManufacturer().string();
+  std::string const model = destination.GetModel().string();
+  throw Failure("\"" + path + "\" has no names for \"" + destination.GetName().string() + "\", " +
+                (maker.empty() || model.empty() ? "whose maker and model are not known"
+                                                : "which is a " + maker + " " + model));
 }
 
 void ShowNames(GlobalOptions const& globals, NamesOptions const& options) {
@@ -50,8 +77,12 @@ void ShowNames(GlobalOptions const& globals, NamesOptions const& options) {
   Destination const destination = FindAnyDestination(session.GetSetup(), options.destination);
   bool const isEdit = !options.file.empty() || !options.standard.empty();
   if (isEdit) {
+    FailIfNothingIsKept(destination);
     destination.SetNames(options.file.empty() ? StandardModeNamed(options.standard)
                                               : DocumentAt(options.file));
+  }
+  if (!options.file.empty()) {
+    FailWithoutNames(destination, options.file);
   }
   PrintOne(globals.json, NamesJSON(destination), NamesLines(destination));
   if (isEdit) {
@@ -59,34 +90,36 @@ void ShowNames(GlobalOptions const& globals, NamesOptions const& options) {
   }
 }
 
-CatalogView LookInCatalog(CatalogOptions const& options) {
-  NamesCatalog& catalog = NamesCatalog::Instance();
-  CatalogView view;
-  if (options.maker.empty()) {
-    catalog.FindStandardModes(view.documents);
-    return view;
-  }
-  UString const maker(options.maker);
-  std::vector<UString> models;
-  if (!options.model.empty()) {
-    models.push_back(UString(options.model));
-  } else {
-    std::vector<DeviceTypeInfo> types;
-    DeviceTypeCatalog::Instance().CollectModels(maker, types);
-    for (DeviceTypeInfo const& type : types) {
-      models.push_back(type.GetModelName());
+/// Those whose `text` is the one that `wanted` means.
+std::vector<NameDocumentOffer> Narrowed(std::vector<NameDocumentOffer> const& offers,
+                                        UString NameDocumentOffer::*text, std::string const& wanted,
+                                        std::string const& kind) {
+  sorted_vector_set<UString> texts;
+  for (NameDocumentOffer const& offer : offers) {
+    if (offer.names.GetType() != Names::kStandardModeNames) {
+      texts.insert(offer.*text);
     }
   }
-  for (UString const& model : models) {
-    catalog.FindMasters(maker, model, view.documents);
-    catalog.FindOverrides(maker, model, view.documents);
+  std::vector<Candidate> candidates;
+  for (UString const& each : texts) {
+    candidates.push_back({each.string()});
   }
-  return view;
+  UString const chosen(candidates[MatchName(candidates, wanted, kind)].name);
+  std::vector<NameDocumentOffer> narrowed;
+  std::copy_if(offers.begin(), offers.end(), std::back_inserter(narrowed),
+               [&](NameDocumentOffer const& offer) { return offer.*text == chosen; });
+  return narrowed;
 }
 
 void ListCatalog(GlobalOptions const& globals, CatalogOptions const& options) {
-  CatalogView const view = LookInCatalog(options);
-  PrintOne(globals.json, CatalogJSON(view), CatalogLines(view));
+  std::vector<NameDocumentOffer> offers = AllOffers();
+  if (!options.maker.empty()) {
+    offers = Narrowed(offers, &NameDocumentOffer::manufacturer, options.maker, "maker");
+  }
+  if (!options.model.empty()) {
+    offers = Narrowed(offers, &NameDocumentOffer::model, options.model, "model");
+  }
+  PrintOne(globals.json, OffersJSON(offers), OffersLines(offers));
 }
 
 }  // namespace
@@ -116,10 +149,10 @@ void AddNamesList(CLI::App& names, CommandLine& line) {
   auto const options = std::make_shared<CatalogOptions>();
   CLI::App* const command = names.add_subcommand(
       "list",
-      "List what the name documents of this machine offer: standard modes, or the "
-      "documents of a maker's models");
-  command->add_option("MAKER", options->maker, "Exactly as in the documents");
-  command->add_option("MODEL", options->model, "Exactly as in the documents");
+      "List what the name documents of this machine offer: standard modes, and documents for "
+      "makers and models");
+  command->add_option("MAKER", options->maker, "Only for this maker");
+  command->add_option("MODEL", options->model, "Only for this model");
   command->callback(
       [&line, options] { line.run = [&line, options] { ListCatalog(line.options, *options); }; });
 }

@@ -55,8 +55,7 @@ Json ControlJSON(Control const& control) {
 }
 
 Json ControlsJSON(ControlListBase const& list) {
-  // A name or a control, as an empty list has neither.
-  if (list.CountControls() == 0 && list.GetName().empty()) {
+  if (!NameDocument::HasControls(list)) {
     return {};
   }
   return {{"name", list.GetName().string()},

@@ -106,10 +106,14 @@ std::string NamesJSON(Destination const& destination) {
                    {"channels", channels}});
 }
 
-std::string CatalogJSON(CatalogView const& view) {
+std::string OffersJSON(std::vector<NameDocumentOffer> const& offers) {
   Json array = Json::array();
-  for (Names const& names : view.documents) {
-    array.push_back(DocumentJson(names));
+  for (NameDocumentOffer const& offer : offers) {
+    bool const isForDevice = offer.names.GetType() != Names::kStandardModeNames;
+    Json json = DocumentJson(offer.names);
+    json["manufacturer"] = isForDevice ? Json(offer.manufacturer.string()) : Json();
+    json["model"] = isForDevice ? Json(offer.model.string()) : Json();
+    array.push_back(json);
   }
   return JsonText({{"documents", array}});
 }

@@ -8,12 +8,13 @@
 namespace Ostinet::Tool {
 namespace {
 
-template <class Handle>
+/// `where` tells handles of one name apart.
+template <class Handle, class Where>
 Handle FindByName(std::vector<Handle> const& handles, std::string const& name,
-                  std::string const& kind) {
+                  std::string const& kind, Where const& where) {
   std::vector<Candidate> candidates;
   for (Handle const& handle : handles) {
-    candidates.push_back({handle.GetName().string(), 0});
+    candidates.push_back({handle.GetName().string(), 0, where(handle)});
   }
   return handles[MatchName(candidates, name, kind)];
 }
@@ -30,14 +31,27 @@ std::vector<Patch> AllPatchesOf(DestinationNameSet const& nameSet, std::string c
   return patches;
 }
 
-std::vector<Patch> WithNumber(std::vector<Patch> const& patches, UString const& number) {
-  std::vector<Patch> found;
+std::string WithoutLeadingZeros(std::string const& number) {
+  std::size_t const first = number.find_first_not_of('0');
+  return first != std::string::npos ? number.substr(first) : number.substr(number.size() - 1);
+}
+
+// Those of exactly this number, else those whose number differs in leading zeros alone.
+std::vector<Patch> WithNumber(std::vector<Patch> const& patches, std::string const& wanted) {
+  std::vector<Patch> exact;
+  std::vector<Patch> alike;
   for (Patch const& patch : patches) {
-    if (patch.GetNumber() == number) {
-      found.push_back(patch);
+    std::string const number = patch.GetNumber().string();
+    if (number.empty() || wanted.empty()) {
+      continue;
+    }
+    if (number == wanted) {
+      exact.push_back(patch);
+    } else if (WithoutLeadingZeros(number) == WithoutLeadingZeros(wanted)) {
+      alike.push_back(patch);
     }
   }
-  return found;
+  return exact.empty() ? alike : exact;
 }
 
 }  // namespace
@@ -58,11 +72,25 @@ short ChannelOf(int channel) {
   return static_cast<short>(channel - 1);
 }
 
+void FailIfNothingIsKept(Destination const& destination) {
+  std::string const name = "\"" + destination.GetName().string() + "\"";
+  if (destination.IsSoftware()) {
+    throw Failure("what is chosen for " + name +
+                  " cannot be kept: it is made by software, which no studio's file holds");
+  }
+  if (destination.IsInterface().get_value_or(false)) {
+    throw Failure(name + " has no names of its own: the instruments that hang on it have");
+  }
+}
+
 DestinationNameSet NameSetOf(Destination const& destination, short channel) {
   DestinationNameSet const nameSet = destination.GetCurrentNameSet(channel);
   if (nameSet.GetImplPtr() == nullptr) {
+    bool const needsMode =
+        destination.CountModes() > 0 && destination.GetCurrentMode().GetImplPtr() == nullptr;
     throw Failure("\"" + destination.GetName().string() + "\" has no names on channel " +
-                  std::to_string(channel + 1));
+                  std::to_string(channel + 1) +
+                  (needsMode ? " before a mode is chosen with ostinet mode" : ""));
   }
   return nameSet;
 }
@@ -76,7 +104,8 @@ std::vector<DestinationMode> ModesOf(Destination const& destination) {
 }
 
 DestinationMode FindMode(Destination const& destination, std::string const& name) {
-  return FindByName(ModesOf(destination), name, "mode");
+  return FindByName(ModesOf(destination), name, "mode",
+                    [](DestinationMode const&) { return std::string(); });
 }
 
 std::vector<PatchBank> BanksOf(DestinationNameSet const& nameSet) {
@@ -87,8 +116,26 @@ std::vector<PatchBank> BanksOf(DestinationNameSet const& nameSet) {
   return banks;
 }
 
+std::string BankNumbersText(PatchBank const& bank) {
+  constexpr unsigned char kNone = 255;
+  auto const half = [](unsigned char number) {
+    return number != kNone ? std::to_string(number) : std::string("-");
+  };
+  bool const hasNone =
+      bank.GetController0Number() == kNone && bank.GetController32Number() == kNone;
+  return hasNone ? std::string()
+                 : half(bank.GetController0Number()) + "/" + half(bank.GetController32Number());
+}
+
 PatchBank FindBank(DestinationNameSet const& nameSet, std::string const& name) {
-  return FindByName(BanksOf(nameSet), name, "bank");
+  std::vector<PatchBank> const banks = BanksOf(nameSet);
+  std::vector<PatchBank> numbered;
+  for (PatchBank const& bank : banks) {
+    if (!name.empty() && BankNumbersText(bank) == name) {
+      numbered.push_back(bank);
+    }
+  }
+  return numbered.size() == 1 ? numbered.front() : FindByName(banks, name, "bank", BankNumbersText);
 }
 
 std::vector<Patch> PatchesOf(PatchBank const& bank) {
@@ -102,14 +149,16 @@ std::vector<Patch> PatchesOf(PatchBank const& bank) {
 Patch FindPatch(DestinationNameSet const& nameSet, std::string const& wanted,
                 std::string const& bank) {
   std::vector<Patch> const patches = AllPatchesOf(nameSet, bank);
-  std::vector<Patch> const numbered = WithNumber(patches, UString(wanted));
+  std::vector<Patch> const numbered = WithNumber(patches, wanted);
   if (numbered.size() == 1) {
     return numbered.front();
   }
   if (!numbered.empty()) {
-    throw Failure("several banks have a patch " + wanted + ": name one with --bank");
+    throw Failure(bank.empty() ? "several banks have a patch " + wanted + ": name one with --bank"
+                               : "the bank has several patches " + wanted + ": name one of them");
   }
-  return FindByName(patches, wanted, "patch");
+  return FindByName(patches, wanted, "patch",
+                    [](Patch const& patch) { return patch.GetBank().GetName().string(); });
 }
 
 Patch FindPatchToShow(Destination const& destination, short channel, std::string const& wanted,

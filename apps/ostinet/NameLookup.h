@@ -21,6 +21,9 @@ Destination FindAnyDestination(Setup const& setup, std::string const& name);
 /// A channel as people count, 1 to 16, as the library does. Throws UsageError for any other.
 short ChannelOf(int channel);
 
+/// Throws Failure where nothing that is chosen for the destination would be there the next time.
+void FailIfNothingIsKept(Destination const& destination);
+
 /// The names of a channel; throws Failure where it has none.
 DestinationNameSet NameSetOf(Destination const& destination, short channel);
 
@@ -28,10 +31,13 @@ std::vector<DestinationMode> ModesOf(Destination const& destination);
 DestinationMode FindMode(Destination const& destination, std::string const& name);
 
 std::vector<PatchBank> BanksOf(DestinationNameSet const& nameSet);
+/// "87/64", or "87/-" and "-/64" with half of it; empty for a bank without numbers.
+std::string BankNumbersText(PatchBank const& bank);
+/// By its numbers, as that text, or by its name.
 PatchBank FindBank(DestinationNameSet const& nameSet, std::string const& name);
 
 std::vector<Patch> PatchesOf(PatchBank const& bank);
-/// By number or name, in all banks or, unless `bank` is empty, in the one of that name.
+/// By number or name, in all banks or, unless `bank` is empty, in the one that it means.
 Patch FindPatch(DestinationNameSet const& nameSet, std::string const& wanted,
                 std::string const& bank);
 

@@ -34,15 +34,20 @@ bool Holds(UString const& name, UString const& wanted) {
 constexpr Fits kWaysToFit[] = {IsExactly, IsButForCase, BeginsWith, Holds};
 
 std::string Listed(std::vector<Candidate> const& candidates, std::vector<size_t> const& places) {
+  constexpr size_t kMost = 20;
   std::string text;
-  for (size_t const place : places) {
-    Candidate const& candidate = candidates[place];
+  for (size_t i = 0; i < places.size() && i < kMost; ++i) {
+    Candidate const& candidate = candidates[places[i]];
     text += (text.empty() ? "\"" : ", \"") + candidate.name + "\"";
     if (candidate.uniqueID != 0) {
       text += " (#" + std::to_string(candidate.uniqueID) + ")";
     }
+    if (!candidate.where.empty()) {
+      text += " (" + candidate.where + ")";
+    }
   }
-  return text;
+  return text +
+         (places.size() > kMost ? " and " + std::to_string(places.size() - kMost) + " more" : "");
 }
 
 std::vector<size_t> AllPlaces(size_t count) {

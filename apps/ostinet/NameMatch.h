@@ -10,8 +10,9 @@ namespace Ostinet::Tool {
 
 /// Something that a user can name.
 struct Candidate {
-  std::string name;  ///< UTF-8
-  int uniqueID;      ///< 0 for what has none
+  std::string name;     ///< UTF-8
+  int uniqueID = 0;     ///< 0 for what has none
+  std::string where{};  ///< what tells it from others of its name, for people; may be empty
 };
 
 /// The place of the candidate that `wanted` means: the one of exactly this name, else the one whose

@@ -11,19 +11,6 @@ using Lines = std::vector<std::string>;
 
 constexpr unsigned char kNoNumber = 255;
 
-// "(bank 1/3, program 5)"; what there is none of is left out.
-std::string NumbersText(int msb, int lsb, int program) {
-  std::string text;
-  if (msb != kNoNumber || lsb != kNoNumber) {
-    auto const half = [](int number) { return number != kNoNumber ? std::to_string(number) : "-"; };
-    text = "bank " + half(msb) + "/" + half(lsb);
-  }
-  if (program != kNoNumber) {
-    text += (text.empty() ? "program " : ", program ") + std::to_string(program);
-  }
-  return text.empty() ? "" : "  (" + text + ")";
-}
-
 char const* TypeText(Names const& names) {
   switch (names.GetType()) {
     case Names::kMasterNames:
@@ -41,8 +28,8 @@ char const* TypeText(Names const& names) {
 }
 
 std::string BankText(PatchBank const& bank) {
-  return bank.GetName().string() +
-         NumbersText(bank.GetController0Number(), bank.GetController32Number(), kNoNumber);
+  std::string const numbers = BankNumbersText(bank);
+  return bank.GetName().string() + (numbers.empty() ? "" : "  (bank " + numbers + ")");
 }
 
 std::string NumberText(double number) {
@@ -71,11 +58,14 @@ Lines NamesLines(Destination const& destination) {
   return lines;
 }
 
-Lines CatalogLines(CatalogView const& view) {
+Lines OffersLines(std::vector<NameDocumentOffer> const& offers) {
   Lines lines;
-  for (Names const& names : view.documents) {
-    lines.push_back(names.GetName().string() + "  (" + TypeText(names) + ")  " +
-                    names.GetFile().GetFullPath().string());
+  for (NameDocumentOffer const& offer : offers) {
+    bool const isForDevice = offer.names.GetType() != Names::kStandardModeNames;
+    lines.push_back(
+        (isForDevice ? offer.manufacturer.string() + " " + offer.model.string() + ": " : "") +
+        offer.names.GetName().string() + "  (" + TypeText(offer.names) + ")  " +
+        offer.names.GetFile().GetFullPath().string());
   }
   return lines;
 }
@@ -104,9 +94,9 @@ Lines PatchesLines(std::vector<PatchBank> const& banks) {
   for (PatchBank const& bank : banks) {
     lines.push_back(BankText(bank));
     for (Patch const& patch : PatchesOf(bank)) {
-      PatchNumbers const numbers = patch.GetPatchNumbers();
+      unsigned char const program = patch.GetPatchNumbers().program;
       lines.push_back("  " + patch.GetNumberAndName().string() +
-                      NumbersText(kNoNumber, kNoNumber, numbers.program));
+                      (program != kNoNumber ? "  (program " + std::to_string(program) + ")" : ""));
     }
   }
   return lines;

@@ -4,23 +4,19 @@
 #include <string>
 #include <vector>
 
-#include "ostinet/NamesCatalog.h"
+#include "ostinet/NameDocument.h"
 
 namespace Ostinet::Tool {
 
 // Names as lines for people and as JSON for scripts. docs/tool.md lists the keys: more may come,
 // but none goes.
 
-/// What `names list` prints.
-struct CatalogView {
-  std::vector<Names> documents;  ///< masters, overriding lists and standard modes
-};
-
 std::vector<std::string> NamesLines(Destination const& destination);
 std::string NamesJSON(Destination const& destination);
 
-std::vector<std::string> CatalogLines(CatalogView const& view);
-std::string CatalogJSON(CatalogView const& view);
+/// What `names list` prints.
+std::vector<std::string> OffersLines(std::vector<NameDocumentOffer> const& offers);
+std::string OffersJSON(std::vector<NameDocumentOffer> const& offers);
 
 std::vector<std::string> ModesLines(Destination const& destination);
 std::string ModesJSON(Destination const& destination);

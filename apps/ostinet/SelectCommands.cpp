@@ -48,6 +48,7 @@ void ChangeMode(GlobalOptions const& globals, ModeOptions const& options) {
   session.RunFor(kUntilSent);
   PrintOne(globals.json, ModesJSON(destination), ModesLines(destination));
   if (!isCurrent) {
+    FailIfNothingIsKept(destination);
     session.Save();
   }
 }
@@ -71,6 +72,9 @@ void NameNote(GlobalOptions const& globals, NoteOptions const& options) {
       FindPatchToShow(destination, ChannelOf(options.channel), options.patch, options.bank);
   NoteNameList const notes = patch.GetNoteNames();
   bool const isEdit = options.clear || options.nameOption->count() > 0;
+  if (isEdit) {
+    FailIfNothingIsKept(destination);
+  }
   if (options.clear) {
     notes.ClearNoteName(pitch);
   } else if (isEdit) {

@@ -47,11 +47,29 @@ class OSTINET_EXPORT NameDocument {
   /// What the notes and controls of a name set are called, for patches that do not say otherwise.
   static DefaultNoteNameList GetDefaultNotes(DestinationNameSet const& nameSet);
   static DefaultControlList GetDefaultControls(DestinationNameSet const& nameSet);
+  /// True if there is a list, be it an empty one; false for a null handle.
+  static bool HasControls(ControlListBase const& list);
 
  private:
   class Contents;
   std::unique_ptr<Contents> const contents_;
 };
+
+/// Something that a name document of this machine offers.
+struct OSTINET_EXPORT NameDocumentOffer {
+  /// A master document, a list of patches that can take the place of a bank's, or a standard mode.
+  Names names;
+  UString manufacturer;  ///< of the device that it is for; empty for a standard mode
+  UString model;         ///< likewise
+};
+
+/// All that the catalog of names can find, in its order: a document once for each device that it
+/// is for, a standard mode once, in the first document that has it. A document that cannot be read
+/// stops nothing; its file is appended to `unreadable`.
+///
+/// Threads  The host's polling thread. It needs no signed-in Setup.
+OSTINET_EXPORT std::vector<NameDocumentOffer> ListNameDocuments(
+    std::vector<FileSpecification>& unreadable);
 
 /// Something about a name document that its author should know.
 struct OSTINET_EXPORT NameDocumentFinding {

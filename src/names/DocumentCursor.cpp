@@ -70,6 +70,12 @@ void DocumentCursor::NoteElement(char const* why) const {
   log_->Add(parser_.CurrentLine(), Described() + why);
 }
 
+void DocumentCursor::NoteOthers() {
+  for (; Down(); Up()) {
+    NoteElement("is passed over: one stands before it");
+  }
+}
+
 void DocumentCursor::NoteUnreadable(XMLLib::Name const& name) const {
   UString text;
   bool const isThere = parser_.ReadAttribute(name, text);

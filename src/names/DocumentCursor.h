@@ -62,6 +62,12 @@ class DocumentCursor {
       NoteElement(why);
     }
   }
+  /// So are all children behind the one that was read: of them one counts.
+  void PassOverOthers() {
+    if (log_ != nullptr) {
+      NoteOthers();
+    }
+  }
   /// The same, if `isMissing` is true when the whole document is read. `isMissing` is asked only
   /// while what it looks at is there.
   template <class IsMissing>
@@ -73,6 +79,7 @@ class DocumentCursor {
 
  private:
   void NoteElement(char const* why) const;
+  void NoteOthers();
   void NoteUnreadable(XMLLib::Name const& name) const;
   void NoteUnreadableIfPresent(XMLLib::Name const& name) const;
   std::string Described() const;

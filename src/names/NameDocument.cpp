@@ -33,8 +33,9 @@ NameDocumentOwner FirstOwner(XMLLib::Parser& parser) {
     } else if (parser.CurrentElement() == kDevice) {
       UString uniqueID;
       parser.ReadAttribute(kUniqueID, uniqueID);
-      Impl::ReadSigned(uniqueID, owner.uniqueID);
-      return owner;
+      if (Impl::ReadSigned(uniqueID, owner.uniqueID)) {
+        return owner;
+      }
     }
   }
   return owner;
@@ -102,6 +103,15 @@ UString NameDocument::GetListName(PatchBank const& bank) {
 
 DefaultNoteNameList NameDocument::GetDefaultNotes(DestinationNameSet const& nameSet) {
   return DefaultNoteNameList(RCPtrMT<Impl::DestNameSetImpl>(Impl::ImplOf(nameSet)));
+}
+
+bool NameDocument::HasControls(ControlListBase const& list) {
+  Impl::ObjectImpl const* const impl = Impl::ImplOf(static_cast<Object const&>(list));
+  if (auto const* const patch = dynamic_cast<Impl::PatchImpl const*>(impl)) {
+    return patch->GetControls().get() != nullptr;
+  }
+  auto const* const nameSet = dynamic_cast<Impl::DestNameSetImpl const*>(impl);
+  return nameSet != nullptr && nameSet->GetDefaultControls().get() != nullptr;
 }
 
 DefaultControlList NameDocument::GetDefaultControls(DestinationNameSet const& nameSet) {

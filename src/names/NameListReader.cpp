@@ -121,6 +121,7 @@ void NameDocumentReader::ReadControl(DocumentCursor& cursor, ControlNameData& li
   if (cursor.Down(kValues)) {
     ReadRange(cursor, control);
     cursor.Up();
+    cursor.PassOverOthers();
   }
   list.controls.insert(control);
 }
@@ -142,6 +143,7 @@ void NameDocumentReader::ReadRange(DocumentCursor& cursor, Control& control) {
     ControlParts::SetValueNames(control, values);
   }
   cursor.Up();
+  cursor.PassOverOthers();
 }
 
 RCPtrMT<ValueListImpl> NameDocumentReader::ReadValueListInPlace(DocumentCursor& cursor) {

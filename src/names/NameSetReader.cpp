@@ -29,6 +29,7 @@ void ReadModeCommands(DocumentCursor& cursor, MIDICommandList& commands) {
   if (cursor.Down(kMIDICommands)) {
     ReadCommands(cursor, SysexInCommands::kAllowed, commands);
     cursor.Up();
+    cursor.PassOverOthers();
   }
 }
 

@@ -259,6 +259,15 @@ TEST_F(DestinationNamesTest, AStoredSelectionIsAppliedToTheNamesAtHand) {
   EXPECT_FALSE(Renew(destination));
 }
 
+TEST_F(DestinationNamesTest, AStoredSelectionOfMoreThan16ChannelsIsCutOff) {
+  Destination const destination = MakeOne();
+  PropertyDict dict = DictOf(destination);
+  dict.entries["currentChannelNameSets"] = std::vector<UString>(20, "Drums");
+  SetDict(destination, dict);
+  ASSERT_EQ(destination.GetCurrentNameSet(15).GetName(), UString("Drums"));
+  EXPECT_EQ(destination.GetCurrentNameSet(16), DestinationNameSet::kNoDestinationNameSet);
+}
+
 TEST_F(DestinationNamesTest, OldHandlesAnswerFromTheOldTree) {
   Destination const destination = MakeOne();
   PatchBank const bank = BankOf(destination);
@@ -366,6 +375,31 @@ TEST_F(ChosenNamesTest, AStandardModeIsPointedAtByADocumentOfOurs) {
   EXPECT_TRUE(written.IsFile());
   setup.SignOut(false);
   EXPECT_FALSE(written.IsFile());
+}
+
+// What is no master document points at a standard mode of its name, whatever that is.
+TEST_F(ChosenNamesTest, OfNoKindPointAtAModeWithoutAName) {
+  Destination const destination = MakeOne();
+  listener.names.clear();
+  destination.SetNames(Names());
+  EXPECT_EQ(KindOf(destination), NameConfiguration::kAutomaticMaster);
+  EXPECT_TRUE(ConfigurationOf(destination).masterFile.IsFile());
+  EXPECT_EQ(destination.CountModes(), 0);
+  EXPECT_EQ(listener.names.size(), 1U);
+}
+
+// What was selected is kept by name, and other names have it or not.
+TEST_F(ChosenNamesTest, KeepTheStoredSelectionAsFarAsTheyHaveIt) {
+  Destination const destination = MakeOne();
+  destination.SendModeChange(destination.GetMode(1));
+  destination.SetNames(Names(Names::kStandardModeNames, FileSpecification(), "General MIDI"));
+  EXPECT_EQ(destination.GetCurrentMode(), DestinationMode::kNoDestinationMode);
+  EXPECT_EQ(destination.GetCurrentNameSet(0), DestinationNameSet::kNoDestinationNameSet);
+  EXPECT_EQ(boost::get<UString>(DictOf(destination).entries["currentDeviceMode"]),
+            UString("Multi"));
+  destination.SetNames(Names(Names::kMasterNames, FileOf("user/One.midnam")));
+  EXPECT_EQ(destination.GetCurrentMode().GetName(), UString("Multi"));
+  EXPECT_EQ(destination.GetCurrentNameSet(15).GetName(), UString("Drums"));
 }
 
 TEST_F(ChosenNamesTest, DropEditsThatAreNotSaved) {

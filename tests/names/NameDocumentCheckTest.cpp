@@ -124,6 +124,58 @@ TEST(NameDocumentCheck, FindsWhatAnEarlierOneLeavesNoRoomFor) {
                   "before it"));
 }
 
+TEST(NameDocumentCheck, FindsPartsForWhoseDevicesAnEarlierOneStands) {
+  auto const part = [](char const* models) {
+    return std::string("\n<ExtendingDeviceNames><Manufacturer>Acme</Manufacturer>") + models +
+           "<PatchNameList Name='L'/></ExtendingDeviceNames>";
+  };
+  EXPECT_THAT(
+      FindingsOf("<MIDINameDocument><Author/>" + part("<Model>One</Model><Model>Two</Model>") +
+                 part("<Model>Two</Model><Model>Three</Model>") + part("<Model>t w o</Model>") +
+                 part("<Model>Four</Model>") + "</MIDINameDocument>"),
+      ElementsAre("P4: ExtendingDeviceNames is not read, as one for its devices stands before it"));
+  EXPECT_THAT(FindingsOf("<MIDINameDocument><Author/>\n<MasterDeviceNames><Manufacturer/><Model/>"
+                         "<SupportsStandardDeviceMode Name='M'/></MasterDeviceNames>\n"
+                         "<MasterDeviceNames><Manufacturer/><Model/>"
+                         "<SupportsStandardDeviceMode Name='M'/></MasterDeviceNames>"
+                         "</MIDINameDocument>"),
+              ElementsAre("P3: MasterDeviceNames is not read, as one for its devices stands before "
+                          "it"));
+}
+
+TEST(NameDocumentCheck, FindsAStandardModeThatStandsTwice) {
+  auto const mode = [](char const* name) {
+    return "\n<StandardDeviceMode Name='" + std::string(name) +
+           "'><ChannelNameSetAssignments><ChannelNameSetAssign Channel='1' NameSet='S'/>"
+           "</ChannelNameSetAssignments><ChannelNameSet Name='S'><AvailableForChannels>"
+           "<AvailableChannel Channel='1'/></AvailableForChannels><PatchBank><PatchNameList/>"
+           "</PatchBank></ChannelNameSet></StandardDeviceMode>";
+  };
+  EXPECT_THAT(
+      FindingsOf("<MIDINameDocument><Author/>" + mode("M") + mode("N") + mode(" m") +
+                 "</MIDINameDocument>"),
+      ElementsAre("P4: StandardDeviceMode \" m\" is not read, as a mode of this name stands "
+                  "before it"));
+}
+
+// Of what may stand once, the reader takes the first.
+TEST(NameDocumentCheck, FindsWhatStandsBehindTheOnlyOneThatIsRead) {
+  std::vector<std::string> const findings =
+      FindingsOf(Valid("<ControlNameList Name='C'><Control Number='1' Name='c'>"
+                       "<Values Min='0' Max='1'><ValueNameList><Value Number='1' Name='v'/>"
+                       "</ValueNameList>\n<ValueNameList/></Values>\n<Values/></Control>"
+                       "</ControlNameList>",
+                       "<MIDICommands><PolyMode/></MIDICommands><PatchNameList/>"));
+  EXPECT_THAT(findings,
+              ::testing::IsSupersetOf({"P11: ValueNameList is passed over: one stands before it",
+                                       "P12: Values is passed over: one stands before it"}));
+  std::vector<std::string> const ofMode = FindingsOf(
+      "<MIDINameDocument><Author/><StandardDeviceMode Name='M'><DeviceModeEnable><MIDICommands>"
+      "<PolyMode/></MIDICommands>\n<MIDICommands/></DeviceModeEnable></StandardDeviceMode>"
+      "</MIDINameDocument>");
+  EXPECT_THAT(ofMode, ::testing::Contains("P2: MIDICommands is passed over: one stands before it"));
+}
+
 TEST(NameDocumentCheck, FindsAttributesThatNobodyReads) {
   EXPECT_THAT(FindingsOf(Valid("",
                                "<MIDICommands>\n<NoteOn Channel='1' Note='1' Velocity='1'/>\n"

@@ -45,6 +45,37 @@ TEST(NameDocument, IsReadForADeviceByItsNumber) {
   EXPECT_EQ(document.CountModes(), 1);
 }
 
+// A number that cannot be read matches no device, so what stands behind it counts.
+TEST(NameDocument, LooksBehindADeviceWithoutANumber) {
+  TemporaryFolder const folder;
+  NameDocument const document(folder.Write(
+      "a.midnam",
+      "<MIDINameDocument><MasterDeviceNames><Device Name='x'/><Manufacturer>Any</Manufacturer>"
+      "<Model>One</Model>" +
+          std::string(kContent) + "</MasterDeviceNames></MIDINameDocument>"));
+  EXPECT_EQ(document.CountModes(), 1);
+}
+
+TEST(NameDocument, TellsAnEmptyListOfControlsFromNone) {
+  TemporaryFolder const folder;
+  NameDocument const document(folder.Write(
+      "a.midnam",
+      MasterText("<ChannelNameSet Name='S'><ControlNameList/><PatchBank><PatchNameList>"
+                 "<Patch Number='1' Name='p'/></PatchNameList></PatchBank></ChannelNameSet>"
+                 "<ChannelNameSet Name='T'><PatchBank><PatchNameList>"
+                 "<Patch Number='1' Name='with'><ControlNameList/></Patch>"
+                 "<Patch Number='2' Name='without'/></PatchNameList></PatchBank>"
+                 "</ChannelNameSet>")));
+  DestinationNameSet const with = document.GetNameSet(0);
+  DestinationNameSet const without = document.GetNameSet(1);
+  EXPECT_TRUE(NameDocument::HasControls(NameDocument::GetDefaultControls(with)));
+  EXPECT_TRUE(NameDocument::HasControls(with.GetBank(0).GetPatch(0).GetControlNames()));
+  EXPECT_FALSE(NameDocument::HasControls(NameDocument::GetDefaultControls(without)));
+  EXPECT_TRUE(NameDocument::HasControls(without.GetBank(0).GetPatch(0).GetControlNames()));
+  EXPECT_FALSE(NameDocument::HasControls(without.GetBank(0).GetPatch(1).GetControlNames()));
+  EXPECT_FALSE(NameDocument::HasControls(ControlList()));
+}
+
 TEST(NameDocument, HasNothingWithoutAMaster) {
   TemporaryFolder const folder;
   for (char const* text :

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "names/NameFolders.h"
 #include "names/NamesSearches.h"
+#include "ostinet/NameDocument.h"
 #include "ostinet/core/Error.h"
 
 namespace Ostinet::Testing {
@@ -170,6 +171,29 @@ TEST_F(NamesCatalogTest, ListsAStandardModeOnceWithItsFirstDocument) {
             Names(Names::kStandardModeNames, mine, "General MIDI"));
 }
 
+TEST_F(NamesCatalogTest, ListsAllThatItCanFind) {
+  folders.Write("user/A.midnam",
+                NameDocument(Master("Acme", "One</Model><Model>Two") + Master("Acme", "One") +
+                             "<MasterDeviceNames><Device UniqueID='3'/></MasterDeviceNames>"));
+  folders.Write("user/B.midnam",
+                NameDocument(Extender("Acme", "One", "<PatchNameList Name='x'/>") +
+                             Extender("Acme", "One", "<PatchNameList Name='second'/>") +
+                             Extender("Other", "Three", "<PatchNameList Name='y'/>")));
+  folders.Write("user/C.midnam", NameDocument(StandardMode("Mode")));
+  folders.Write("user/D.midnam", NameDocument(StandardMode("Mode")));
+  std::vector<std::string> all;
+  std::vector<FileSpecification> unreadable;
+  for (NameDocumentOffer const& offer : ListNameDocuments(unreadable)) {
+    all.push_back(offer.manufacturer.string() + "/" + offer.model.string() + "/" +
+                  offer.names.GetName().string() + "/" + std::to_string(offer.names.GetType()));
+  }
+  EXPECT_THAT(all, ElementsAre("Acme/One/A/1", "Acme/Two/A/1", "Acme/One/x/3", "Other/Three/y/3",
+                               "//Mode/2"));
+  EXPECT_THAT(unreadable, IsEmpty());
+  folders.Remove("user/A.midnam");
+  EXPECT_EQ(ListNameDocuments(unreadable).size(), 3u);
+}
+
 TEST_F(NamesCatalogTest, TakesTheFirstManufacturerThatSaysSomething) {
   folders.Write("user/A.midnam",
                 NameDocument("<MasterDeviceNames><Manufacturer/><Manufacturer>Acme</Manufacturer>"
@@ -237,6 +261,12 @@ TEST_F(BrokenDocumentTest, StopsAHostsSearchAndIsTriedAgain) {
 TEST_F(BrokenDocumentTest, IsPassedOverByTheLibrarysOwnSearches) {
   EXPECT_EQ(Impl::FindMasterNames("Acme", "One").GetFile(), good);
   EXPECT_FALSE(Impl::FindStandardModeNames("General MIDI").Exists());
+}
+
+TEST_F(BrokenDocumentTest, StopsNoListOfAllAndIsNamedThere) {
+  std::vector<FileSpecification> unreadable;
+  EXPECT_FALSE(ListNameDocuments(unreadable).empty());
+  EXPECT_EQ(unreadable.size(), 1u);
 }
 
 TEST_F(BrokenDocumentTest, LeavesNothingOfWhatWasReadOfIt) {

@@ -66,6 +66,27 @@ TEST_F(OverridesTest, AreStoredAndReadBack) {
   EXPECT_EQ(FirstPatch(destination, 1), UString("Yours"));
 }
 
+// Anything may stand in a user's file.
+TEST_F(OverridesTest, EntriesWithoutAFileDoNotCount) {
+  File const lists = WriteLists();
+  Destination const destination = MakeOne();
+  Impl::PropertyDict whole;
+  whole.entries["file"] = Impl::PropertyPath{lists.GetFullPath()};
+  Impl::PropertyDict withoutFile;
+  withoutFile.entries["patchNameList"] = UString("first");
+  Impl::PropertyDict banks;
+  banks.entries["Preset"] = whole;
+  banks.entries["User"] = withoutFile;
+  banks.entries["Text"] = UString("first");
+  Impl::PropertyDict dict = DictOf(destination);
+  dict.entries["banks"] = banks;
+  SetDict(destination, dict);
+  EXPECT_TRUE(Renew(destination));
+  ASSERT_EQ(ConfigurationOf(destination).overrides.size(), 1U);
+  EXPECT_EQ(ConfigurationOf(destination).overrides.begin()->first, UString("Preset"));
+  EXPECT_EQ(FirstPatch(destination, 0), UString("Preset 1")) << "no list of an empty name is there";
+}
+
 TEST_F(OverridesTest, NoNamesTakeTheOverrideAwayAndEmptyTheBank) {
   File const lists = WriteLists();
   Destination const destination = MakeOne();

@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: MIT
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 #include "Errors.h"
 #include "NameMatch.h"
 
@@ -45,6 +47,28 @@ TEST(MatchName, NamesTheCandidatesOfAnAmbiguousName) {
   EXPECT_EQ(Complaint("Interf"),
             "more than one destination fits \"Interf\": \"Interface 1\" (#11), "
             "\"Interface 10\" (#12)");
+}
+
+TEST(MatchName, TellsCandidatesOfOneNameApart) {
+  try {
+    MatchName({{"Piano", 0, "Preset A"}, {"Piano", 0, "User"}}, "pi", "patch");
+    FAIL();
+  } catch (Failure const& failure) {
+    EXPECT_STREQ(failure.what(),
+                 "more than one patch fits \"pi\": \"Piano\" (Preset A), \"Piano\" (User)");
+  }
+}
+
+TEST(MatchName, NamesTwentyCandidatesAtMost) {
+  std::vector<Candidate> const many(23, Candidate{"P"});
+  try {
+    MatchName(many, "nothing", "patch");
+    FAIL();
+  } catch (Failure const& failure) {
+    std::string const text = failure.what();
+    EXPECT_EQ(std::count(text.begin(), text.end(), 'P'), 20);
+    EXPECT_NE(text.find("\"P\" and 3 more"), std::string::npos);
+  }
 }
 
 TEST(MatchName, CountsTwoOfTheSameNameAsAmbiguous) {

@@ -101,6 +101,7 @@ TEST_F(NamesCommands, SelectAPatchByNumberOrName) {
   ToolRun const ambiguous = Do({"select", "Out 1", "1", "1"});
   EXPECT_EQ(ambiguous.exitCode, kFailed);
   EXPECT_THAT(ambiguous.err, HasSubstr("several banks have a patch 1"));
+  EXPECT_EQ(DoJSON({"select", "Out 1", "1", "001", "--bank", "B"})["name"], "Organ");
   EXPECT_EQ(Do({"select", "Out 1", "17", "Piano"}).exitCode, kUsage);
   EXPECT_EQ(Do({"select", "Out 1", "1", "Flute"}).exitCode, kFailed);
 }
@@ -109,6 +110,17 @@ TEST_F(NamesCommands, KeepAMode) {
   ChooseDocument();
   EXPECT_EQ(Do({"mode", "Out 1", "multi"}).exitCode, kDone);
   EXPECT_EQ(DoJSON({"names", "Out 1"})["mode"], "Multi");
+}
+
+// Other names have the old mode or not; none is guessed.
+TEST_F(NamesCommands, AskForAModeWhereTheStoredOneIsGone) {
+  ChooseDocument();
+  ASSERT_EQ(Do({"mode", "Out 1", "multi"}).exitCode, kDone);
+  ASSERT_EQ(Do({"names", "Out 1", "--standard", "General MIDI"}).exitCode, kDone);
+  EXPECT_TRUE(DoJSON({"names", "Out 1"})["mode"].is_null());
+  EXPECT_THAT(Do({"banks", "Out 1"}).err, HasSubstr("before a mode is chosen"));
+  ASSERT_EQ(Do({"mode", "Out 1", "General"}).exitCode, kDone);
+  EXPECT_EQ(Do({"banks", "Out 1"}).exitCode, kDone);
 }
 
 TEST_F(NamesCommands, KeepTheNameOfANote) {
@@ -123,7 +135,79 @@ TEST_F(NamesCommands, ListTheStandardModesOfTheMachine) {
   json const documents = DoJSON({"names", "list"})["documents"];
   ASSERT_EQ(documents.size(), 2u);
   EXPECT_EQ(documents[0]["type"], "standard");
-  EXPECT_EQ(DoJSON({"names", "list", "No such maker", "x"})["documents"].size(), 0u);
+  EXPECT_TRUE(documents[0]["manufacturer"].is_null());
+  EXPECT_EQ(Do({"names", "list", "No such maker", "x"}).exitCode, kFailed);
+}
+
+// A model needs no device type to be listed, and a broken document keeps no other from it.
+TEST_F(NamesCommands, ListTheDocumentsOfAMakerAndAModel) {
+  WriteFile("Broken.midnam", "<MIDINameDocument");
+  WriteFile("Two.midnam",
+            "<MIDINameDocument><Author/><MasterDeviceNames><Manufacturer>Acme</Manufacturer>"
+            "<Model>Two</Model><Model>Three</Model></MasterDeviceNames></MIDINameDocument>");
+  WriteFile("More.midnam",
+            "<MIDINameDocument><Author/><ExtendingDeviceNames><Manufacturer>Acme</Manufacturer>"
+            "<Model>Two</Model><PatchNameList Name='Kits'/></ExtendingDeviceNames>"
+            "</MIDINameDocument>");
+  auto const list = [this](std::string const& words) {
+    return RunShell((IsPOSIX() ? "OSTINET_USER_FOLDER=\"" + PathOf("") + "\" "
+                               : "set \"OSTINET_USER_FOLDER=" + PathOf("") + "\"&& ") +
+                    "PROGRAM names list --json " + words);
+  };
+  ToolRun const all = list("");
+  EXPECT_EQ(all.exitCode, kDone);
+  EXPECT_THAT(all.err, HasSubstr("Broken.midnam\" cannot be read"));
+  EXPECT_EQ(json::parse(all.out)["documents"].size(), 6u) << "with One.midnam and two modes";
+  json const ofModel = json::parse(list("acme two").out)["documents"];
+  ASSERT_EQ(ofModel.size(), 2u);
+  EXPECT_EQ(ofModel[0]["type"], "override");
+  EXPECT_EQ(ofModel[0]["name"], "Kits");
+  EXPECT_EQ(ofModel[1]["type"], "master");
+  EXPECT_EQ(ofModel[1]["manufacturer"], "Acme");
+  EXPECT_EQ(ofModel[1]["model"], "Two");
+  EXPECT_EQ(json::parse(list("acme").out)["documents"].size(), 3u);
+  EXPECT_EQ(list("acme four").exitCode, kFailed);
+}
+
+TEST_F(NamesCommands, RefuseADocumentForAnotherDevice) {
+  std::string const other = WriteFile(
+      "Other.midnam",
+      "<MIDINameDocument><Author/><MasterDeviceNames><Manufacturer>Acme</Manufacturer>"
+      "<Model>Two</Model><CustomDeviceMode Name='M'/></MasterDeviceNames></MIDINameDocument>");
+  ToolRun const run = Do({"names", "Out 1", "--set", other});
+  EXPECT_EQ(run.exitCode, kFailed);
+  EXPECT_EQ(run.out, "");
+  EXPECT_THAT(run.err, HasSubstr("has no names for \"Out 1\""));
+  EXPECT_EQ(DoJSON({"names", "Out 1"})["names"]["name"], "Default Names");
+}
+
+// The studio's file holds no ports that software makes.
+TEST_F(NamesCommands, SayWhereNothingWouldBeKept) {
+  auto const onSynth = [this](std::vector<std::string> const& arguments) {
+    return RunOn(R"({"ports": [{"name": "Soft", "kind": "directmusic-out", "dls": true}]})",
+                 arguments);
+  };
+  EXPECT_EQ(onSynth({"names", "Soft"}).exitCode, kDone);
+  EXPECT_EQ(onSynth({"note-name", "Soft", "1", "60"}).exitCode, kDone);
+  for (auto const& edit :
+       std::vector<std::vector<std::string>>{{"names", "Soft", "--standard", "Default Names"},
+                                             {"names", "Soft", "--set", document},
+                                             {"note-name", "Soft", "1", "60", "Bell"},
+                                             {"note-name", "Soft", "1", "60", "--clear"}}) {
+    ToolRun const run = onSynth(edit);
+    EXPECT_EQ(run.exitCode, kFailed) << edit[0];
+    EXPECT_EQ(run.out, "") << edit[0];
+    EXPECT_THAT(run.err, HasSubstr("cannot be kept")) << edit[0];
+  }
+}
+
+// The numbers of a bank tell it from another of its name.
+TEST_F(NamesCommands, TakeABankByItsNumbers) {
+  ChooseDocument();
+  EXPECT_EQ(DoJSON({"select", "Out 1", "1", "1", "--bank", "1/-"})["name"], "Piano");
+  EXPECT_EQ(Do({"select", "Out 1", "1", "1", "--bank", "1/0"}).exitCode, kFailed);
+  EXPECT_THAT(Do({"banks", "Out 1"}).Lines(),
+              ElementsAre("A  (bank 1/-)  1 patches", "B  1 patches"));
 }
 
 TEST_F(NamesCommands, TellWrongUse) {

@@ -85,6 +85,22 @@ TEST_F(NamesDocumentCommands, ShowPrintsTheTreeForPeople) {
             "    L  LSB 3\n      A1 Piano\n      A2 Bass\n");
 }
 
+// A patch that hides every default control has a list all the same.
+TEST_F(NamesDocumentCommands, ShowTellsAnEmptyListFromNone) {
+  std::string const path =
+      WriteFile("a.midnam",
+                "<MIDINameDocument><Author/><MasterDeviceNames><Manufacturer>M</Manufacturer>"
+                "<Model>N</Model><ChannelNameSet Name='S'><ControlNameList Name='C'>"
+                "<Control Number='1' Name='c'/></ControlNameList><PatchBank><PatchNameList>"
+                "<Patch Number='1' Name='p'><ControlNameList><Control Number='1' Name=''/>"
+                "</ControlNameList></Patch></PatchNameList></PatchBank></ChannelNameSet>"
+                "<ChannelNameSet Name='T'/></MasterDeviceNames></MIDINameDocument>");
+  json const sets = json::parse(RunBare({"names", "show", "--json", path}).out)["nameSets"];
+  EXPECT_EQ(sets[0]["banks"][0]["patches"][0]["controls"],
+            json::parse(R"({"name": "", "controls": []})"));
+  EXPECT_TRUE(sets[1]["controls"].is_null());
+}
+
 TEST_F(NamesDocumentCommands, ShowPrintsEmptyListsWithoutAMaster) {
   ToolRun const run = RunBare({"names", "show", "--json",
                                WriteFile("a.midnam",
