@@ -35,6 +35,7 @@ void AddVirtualCommand(CLI::App& app, CommandLine& line);
 void AddDrawCommand(CLI::App& app, CommandLine& line);
 void AddTypesCommand(CLI::App& app, CommandLine& line);
 void AddDetectCommand(CLI::App& app, CommandLine& line);
+void AddDiagCommand(CLI::App& app, CommandLine& line);
 void AddNamesCommand(CLI::App& app, CommandLine& line);
 void AddModesCommand(CLI::App& app, CommandLine& line);
 void AddBanksCommand(CLI::App& app, CommandLine& line);

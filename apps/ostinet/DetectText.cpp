@@ -74,8 +74,6 @@ std::string FindingLine(FindingView const& finding) {
   return line;
 }
 
-Json TextOrNull(std::string const& text) { return text.empty() ? Json() : Json(text); }
-
 Json NameJson(PortName const& name) { return {{"name", name.name}, {"uniqueID", name.uniqueID}}; }
 
 Json FindingJson(FindingView const& finding) {

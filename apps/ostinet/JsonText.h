@@ -14,6 +14,9 @@ using Json = nlohmann::ordered_json;
 std::string JsonLine(Json const& json);
 std::string JsonText(Json const& json);
 
+/// Null for an empty text.
+Json TextOrNull(std::string const& text);
+
 /// A number of the names: 255 means none, which is null.
 Json NumberOrNull(unsigned char number);
 

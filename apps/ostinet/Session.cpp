@@ -42,8 +42,8 @@ Folder FolderAt(std::string const& path) {
 }
 
 // A folder that the user named has to work. Without the user's own one the program still runs.
-std::unique_ptr<FolderPrefs> OpenSettings(std::string const& path) {
-  Folder const folder = path.empty() ? FolderPrefs::UserFolder("Ostinet") : FolderAt(path);
+std::unique_ptr<FolderPrefs> OpenSettings(GlobalOptions const& options) {
+  Folder const folder = SettingsFolder(options);
   if (!folder.IsValid()) {
     return nullptr;
   }
@@ -53,7 +53,7 @@ std::unique_ptr<FolderPrefs> OpenSettings(std::string const& path) {
   } catch (std::exception const& error) {
     std::string const sentence = "the settings folder \"" + folder.GetFullPath().string() +
                                  "\" cannot be written to: " + error.what();
-    if (!path.empty()) {
+    if (!options.settings.empty()) {
       throw Failure(sentence);
     }
     Notify(sentence + "; going on without settings");
@@ -120,10 +120,15 @@ PollLoop::Options LoopOptions() {
 // The library chooses its system at the first call, so the studio comes before all else.
 std::unique_ptr<FolderPrefs> Prepare(GlobalOptions const& options) {
   ChooseStudio(options.studio);
-  return OpenSettings(options.settings);
+  return OpenSettings(options);
 }
 
 }  // namespace
+
+Folder SettingsFolder(GlobalOptions const& options) {
+  std::string const& path = options.settings;
+  return path.empty() ? FolderPrefs::UserFolder("Ostinet") : FolderAt(path);
+}
 
 Session::Session(GlobalOptions const& options, Receiver* receiver, SetupListener* listener)
     : prefs_(Prepare(options)), loop_(LoopOptions()), callbacks_([this] { loop_.Hurry(); }) {
@@ -187,9 +192,13 @@ void Session::Save() {
   virtualEndpoints_.Save(FileInSettings(kVirtualEndpointsFile));
 }
 
+std::string Session::SettingsFault() const {
+  return prefs_ != nullptr ? prefs_->LastError() : std::string();
+}
+
 void Session::FailIfSettingsFailed() const {
-  if (!prefs_->LastError().empty()) {
-    throw Failure("settings could not be kept: " + prefs_->LastError());
+  if (!SettingsFault().empty()) {
+    throw Failure("settings could not be kept: " + SettingsFault());
   }
 }
 
@@ -201,8 +210,8 @@ Session::~Session() {
   } catch (std::exception const& error) {
     Notify(error.what());
   }
-  if (wasSignedIn && prefs_ != nullptr && !prefs_->LastError().empty()) {
-    Notify("settings could not be kept: " + prefs_->LastError());
+  if (wasSignedIn && !SettingsFault().empty()) {
+    Notify("settings could not be kept: " + SettingsFault());
   }
 }
 

@@ -38,6 +38,9 @@ class Session : private Noncopyable<Session> {
   /// The user's virtual endpoints, to be edited.
   VirtualEndpoints& GetVirtualEndpoints() { return virtualEndpoints_; }
 
+  /// What the first failure to read or write the settings said; empty while all went well.
+  std::string SettingsFault() const;
+
   /// Signs out and keeps what was edited: the last thing that a command does. Throws Failure where
   /// it could not be kept; the files are then as they were.
   void Save();
@@ -61,6 +64,10 @@ class Session : private Noncopyable<Session> {
   VirtualEndpoints virtualEndpoints_;
   std::string damage_;  // a sentence, where the studio's file cannot be read to its end
 };
+
+/// The folder of the settings: the one that was named, else the user's own. An invalid folder where
+/// the user has none.
+Folder SettingsFolder(GlobalOptions const& options);
 
 /// When a command that listens ends by itself.
 struct Limits {

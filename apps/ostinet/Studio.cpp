@@ -11,17 +11,6 @@
 
 namespace Ostinet::Tool {
 
-namespace {
-
-// The machine without MIDI runs on an empty simulated studio too, so its being simulated does not
-// tell whether anybody asked for it.
-bool IsStudioAskedFor(std::string const& studioFile) {
-  char const* const variable = std::getenv("OSTINET_STUDIO");
-  return !studioFile.empty() || (variable != nullptr && *variable != '\0');
-}
-
-}  // namespace
-
 void ChooseStudio(std::string const& studioFile) {
   try {
     if (studioFile.empty()) {
@@ -36,8 +25,16 @@ void ChooseStudio(std::string const& studioFile) {
   }
 }
 
+// The machine without MIDI runs on an empty simulated studio too, so its being simulated does not
+// tell whether anybody asked for it.
+std::string StudioFileAskedFor(std::string const& studioFile) {
+  char const* const variable = std::getenv("OSTINET_STUDIO");
+  return studioFile.empty() && variable != nullptr ? variable : studioFile;
+}
+
 std::string WhyNoMIDI(std::string const& studioFile) {
-  std::string const why = IsStudioAskedFor(studioFile) ? std::string() : WhyNoMachineMIDI();
+  bool const isStudio = !StudioFileAskedFor(studioFile).empty();
+  std::string const why = isStudio ? std::string() : WhyNoMachineMIDI();
   return why.empty()
              ? why
              : why + " To run on a simulated studio, describe one in a file: --studio FILE.json";

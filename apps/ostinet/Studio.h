@@ -10,6 +10,9 @@ namespace Ostinet::Tool {
 /// the machine). Throws Failure for a file that describes no studio.
 void ChooseStudio(std::string const& studioFile);
 
+/// The studio file that was asked for, by that option or by the environment; empty if none was.
+std::string StudioFileAskedFor(std::string const& studioFile);
+
 /// Where the machine has no MIDI and nobody asked for a simulated studio, by that option or by the
 /// environment: why, and what to do about it; else empty.
 std::string WhyNoMIDI(std::string const& studioFile);

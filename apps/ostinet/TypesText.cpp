@@ -73,8 +73,6 @@ Json DeviceIDJson(DeviceTypeFacts const& facts) {
       {"default", facts.defaultDeviceID}, {"min", facts.minDeviceID}, {"max", facts.maxDeviceID}};
 }
 
-Json TextOrNull(std::string const& text) { return text.empty() ? Json() : Json(text); }
-
 }  // namespace
 
 std::vector<std::string> MakerLines(MakerCounts const& makers) {

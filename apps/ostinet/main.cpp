@@ -67,13 +67,13 @@ int Main(int argc, char** argv) {
   Describe(app);
   AddGlobals(app, line.options);
   for (auto const add :
-       {AddListCommand,    AddWatchCommand,      AddMonitorCommand, AddSendCommand,
-        AddPanicCommand,   AddRefCommand,        AddResolveCommand, AddPairCommand,
-        AddTypesCommand,   AddDetectCommand,     AddDeviceCommand,  AddEntityCommand,
-        AddConnectCommand, AddDisconnectCommand, AddVirtualCommand, AddDrawCommand,
-        AddNamesCommand,   AddModesCommand,      AddBanksCommand,   AddPatchesCommand,
-        AddNotesCommand,   AddControlsCommand,   AddSelectCommand,  AddModeCommand,
-        AddNoteNameCommand}) {
+       {AddListCommand,     AddWatchCommand,      AddMonitorCommand, AddSendCommand,
+        AddPanicCommand,    AddRefCommand,        AddResolveCommand, AddPairCommand,
+        AddTypesCommand,    AddDetectCommand,     AddDeviceCommand,  AddEntityCommand,
+        AddConnectCommand,  AddDisconnectCommand, AddVirtualCommand, AddDrawCommand,
+        AddNamesCommand,    AddModesCommand,      AddBanksCommand,   AddPatchesCommand,
+        AddNotesCommand,    AddControlsCommand,   AddSelectCommand,  AddModeCommand,
+        AddNoteNameCommand, AddDiagCommand}) {
     add(app, line);
   }
   try {

@@ -82,6 +82,19 @@ TEST(Declarations, OfEndpointsAreComplete) {
   Link<Const<Destination, void, DestinationMode const&>>(&Destination::SendModeChange);
   Link<Const<Destination, void, short, Patch const&>>(&Destination::SendPatchChange);
 
+  Link<Static<bool, Endpoint const&, Endpoint const&>>(&CompMIDIEndpointNames);
+
+  Link<Static<ObjectFilter<Endpoint>&>>(&DirectEndpoint);
+  Link<Static<ObjectFilter<Endpoint>&>>(&OnlineEndpoint);
+  Link<Static<ObjectFilter<Endpoint>&>>(&PublicEndpoint);
+  Link<Static<ObjectFilter<Endpoint>&>>(&SoftwareEndpoint);
+  Link<Static<ObjectFilter<Endpoint>&>>(&DefinitelyInterfaceEndpoint);
+  Link<Static<ObjectFilter<Endpoint>&>>(&DefinitelyNonInterfaceEndpoint);
+  Link<Static<ObjectFilter<Endpoint>&>>(&CouldBeInterfaceEndpoint);
+  Link<Static<ObjectFilter<Endpoint>&>>(&CouldBeNonInterfaceEndpoint);
+  Link<Static<ObjectFilter<Endpoint>&>>(&EntitylessNonSoftwareEndpoint);
+  Link<Static<ObjectFilter<Device>&>>(&DirectDevice);
+
   Link<Mutable<DestinationList, void, ObjectFilter<Endpoint> const&>>(&DestinationList::Reset);
   Link<Mutable<DestinationList, void, std::vector<ObjectFilter<Endpoint>>&>>(
       &DestinationList::Sort);

@@ -222,6 +222,42 @@ TEST_F(Editing, ANewDeviceHasOneEntityWithOneOfEach) {
   EXPECT_EQ(device.GetEntity(0).CountDestinations(), 1);
 }
 
+// What it edits there is told in the next round, and no walk of this round is disturbed.
+TEST_F(Editing, AListenerMayEditWhileChangesAreHandedOut) {
+  struct Editor : RecordingListener {
+    void DestinationNamesChanged(Destination destination, unsigned short channels) override {
+      RecordingListener::DestinationNamesChanged(destination, channels);
+      onNames(destination);
+    }
+    std::function<void(Destination const&)> onNames;
+  };
+  std::vector<Device> devices;
+  for (int i = 0; i < 3; ++i) {
+    devices.push_back(setup.CreateDevice(UString("Synth")));
+  }
+  setup.PollSetupChanges();
+  Editor editor;
+  editor.onNames = [&](Destination const&) {
+    for (Device const& device : devices) {
+      setup.DeleteDevice(device);
+    }
+    setup.CreateDevice(UString("Heir"));
+  };
+  setup.SetListener(&editor);
+  for (Device const& device : devices) {
+    device.SetSupportsGeneralMIDI(true);
+  }
+  setup.PollSetupChanges();
+  setup.SetListener(&listener);
+  EXPECT_EQ(editor.names.size(), 1u);  // the other two had gone
+  ASSERT_EQ(setup.CountDevices(), 1);
+  EXPECT_EQ(setup.GetDevice(0).GetName(), UString("Heir"));
+  editor.names.clear();
+  listener.setupChanges = 0;
+  setup.PollSetupChanges();
+  EXPECT_EQ(listener.setupChanges, 1);
+}
+
 TEST_F(Editing, CountsOfEndpointsGoUpAndDownToNothing) {
   Entity const entity = setup.CreateDevice(UString("Synth")).GetEntity(0);
   setup.SetEntitySources(entity, 3);

@@ -270,6 +270,29 @@ TEST_F(DirectMusicInput, AnEndlessDriverDoesNotHangThePoll) {
   midi.SetEndless("Read", false);
 }
 
+// What stood behind the packet in the same buffer goes with the port.
+TEST_F(DirectMusicInput, ItsReceiverMaySignOut) {
+  midi.Inject("In", {0x90, 1, 1});
+  midi.Inject("In", {0x90, 2, 1});
+  receiver.onPacket = [this](Bytes const&) { SignOut(); };
+  setup.ProcessInput();
+  EXPECT_FALSE(setup.IsSignedIn());
+  EXPECT_THAT(receiver.AllBytes(), ElementsAre(Bytes{0x90, 1, 1}));
+}
+
+TEST_F(DirectMusicInput, ItsReceiverMayPollWhileThePortGoes) {
+  midi.Inject("In", {0x90, 1, 1});
+  midi.Inject("In", {0x90, 2, 1});
+  Source const in = Src("In");
+  receiver.onPacket = [this](Bytes const&) {
+    midi.RemovePort("In");
+    Rescan();
+  };
+  setup.ProcessInput();
+  EXPECT_FALSE(in.IsOnline());
+  EXPECT_THAT(receiver.AllBytes(), ElementsAre(Bytes{0x90, 1, 1}));
+}
+
 class VirtualPair : public PlatformTest {
  protected:
   VirtualPair() {
@@ -306,6 +329,21 @@ TEST_F(VirtualPair, CarriesLongMessagesByReference) {
   destination.SendSysex(At(9), SysexRef(sysex.data(), sysex.size()));
   setup.ProcessInput();
   EXPECT_THAT(receiver.AllBytes(), ElementsAre(sysex));
+}
+
+TEST_F(VirtualPair, AReceiverThatThrowsIsHeardAndLosesOnePacket) {
+  for (unsigned char i = 1; i <= 3; ++i) {
+    Send(destination, {0x90, i, 1});
+  }
+  receiver.onPacket = [](Bytes const& bytes) {
+    if (bytes[1] == 2) {
+      throw std::runtime_error("host");
+    }
+  };
+  EXPECT_THROW(setup.ProcessInput(), std::runtime_error);
+  setup.ProcessInput();
+  EXPECT_EQ(receiver.AllBytes().back(), (Bytes{0x90, 3, 1}));
+  EXPECT_EQ(receiver.packets.size(), 3u);
 }
 
 TEST_F(VirtualPair, OnlyTheWantedEndIsPublic) {

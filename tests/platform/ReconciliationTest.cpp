@@ -1,10 +1,14 @@
 // SPDX-License-Identifier: MIT
 
+#include <functional>
 #include <random>
+#include <set>
 
 #include "model/DestinationImpl.h"
+#include "ostinet/core/Error.h"
 #include "platform/PlatformTest.h"
 #include "platform/WinMIDIPort.h"
+#include "platform/system/simulated/SimulatedSystem.h"
 
 namespace Ostinet::Testing {
 namespace {
@@ -290,32 +294,187 @@ TEST_F(Reconciliation, ABareEndpointCanBeDeletedOnlyWhileOffline) {
   EXPECT_THAT(DestNames(), IsEmpty());
 }
 
+/// A system whose drivers can fail with an exception while they are listed.
+class ThrowingSystem : public Impl::Simulated::SimulatedSystem {
+ public:
+  UINT midiOutGetNumDevs() override {
+    if (throws) {
+      throw VantorError("Test", "Driver", 7, "no list");
+    }
+    return SimulatedSystem::midiOutGetNumDevs();
+  }
+  std::atomic<bool> throws{false};  // set by the test, read by the job thread
+};
+
+TEST_F(Reconciliation, AListingThatFailsIsToldOnceAndTheNextGoesOn) {
+  auto const system = std::make_shared<ThrowingSystem>();
+  Impl::InstallSystem(system);
+  SignIn();
+  setup.CreateDevice(UString("Synth"));
+  listener.setupChanges = 0;
+  system->throws = true;
+  ListPorts();
+  EXPECT_THROW(setup.PollSetupChanges(), VantorError);
+  EXPECT_EQ(listener.setupChanges, 0);
+  setup.PollSetupChanges();
+  EXPECT_EQ(listener.setupChanges, 1);  // of the new device, which waited
+  system->throws = false;
+  SimulatedPort port;
+  port.name = "Out";
+  system->GetStudio().AddPort(port);
+  Rescan();
+  EXPECT_THAT(DestNames(), ElementsAre("Synth", "Out"));
+  SignOut();
+  midi.Install();
+}
+
+// What sources and destinations name differently.
+Source DirectOf(Source const& each) { return each.GetDirectSource(); }
+Destination DirectOf(Destination const& each) { return each.GetDirectDestination(); }
+int CountConnected(Source const& each) { return each.CountConnectedSources(); }
+int CountConnected(Destination const& each) { return each.CountConnectedDestinations(); }
+Source ConnectedOf(Source const& each, int i) { return each.GetConnectedSource(i); }
+Destination ConnectedOf(Destination const& each, int i) { return each.GetConnectedDestination(i); }
+
+/// Both ends of each link agree, and what is a port is online exactly while it has one.
+template <class Handle>
+void ExpectEndsAgree(Handle const& each) {
+  ASSERT_TRUE(each.Exists());
+  for (int k = 0; k < CountConnected(each); ++k) {
+    ASSERT_EQ(DirectOf(ConnectedOf(each, k)), each);
+  }
+  Handle const port = DirectOf(each);
+  if (port.Exists()) {
+    bool isListed = false;
+    for (int k = 0; k < CountConnected(port); ++k) {
+      isListed = isListed || ConnectedOf(port, k) == each;
+    }
+    ASSERT_TRUE(isListed);
+  }
+  if (each.IsDirect() && !each.IsVirtual()) {
+    auto const& impl =
+        *static_cast<Impl::EndpointImpl*>(static_cast<Impl::ObjectImpl*>(each.GetImplPtr()));
+    ASSERT_EQ(each.IsOnline(), Impl::WinMIDIPort::Of(impl)->GetActiveImpl() != nullptr);
+  }
+}
+
+/// The endpoints of a list that belong to an entity.
+template <class Handle>
+std::set<Handle> InEntities(int count, std::function<Handle(int)> const& get) {
+  std::set<Handle> result;
+  for (int i = 0; i < count; ++i) {
+    if (get(i).GetEntity().Exists()) {
+      result.insert(get(i));
+    }
+  }
+  return result;
+}
+
+/// The lists hold exactly what the devices have.
+void ExpectListsAgree(Setup const& setup) {
+  std::set<Entity> entities;
+  std::set<Source> sources;
+  std::set<Destination> destinations;
+  for (int i = 0; i < setup.CountDevices(); ++i) {
+    Device const device = setup.GetDevice(i);
+    for (int k = 0; k < device.CountEntities(); ++k) {
+      Entity const entity = device.GetEntity(k);
+      ASSERT_EQ(entity.GetDevice(), device);
+      entities.insert(entity);
+      for (int n = 0; n < entity.CountSources(); ++n) {
+        sources.insert(entity.GetSource(n));
+      }
+      for (int n = 0; n < entity.CountDestinations(); ++n) {
+        destinations.insert(entity.GetDestination(n));
+      }
+    }
+  }
+  ASSERT_EQ(static_cast<int>(entities.size()), setup.CountEntities());
+  for (int i = 0; i < setup.CountEntities(); ++i) {
+    ASSERT_EQ(entities.count(setup.GetEntity(i)), 1u);
+  }
+  ASSERT_EQ(sources,
+            InEntities<Source>(setup.CountSources(), [&](int i) { return setup.GetSource(i); }));
+  ASSERT_EQ(destinations, InEntities<Destination>(setup.CountDestinations(),
+                                                  [&](int i) { return setup.GetDestination(i); }));
+}
+
 /// What must hold of a studio at any time.
 void ExpectWhole(Setup const& setup) {
+  for (int i = 0; i < setup.CountSources(); ++i) {
+    ASSERT_NO_FATAL_FAILURE(ExpectEndsAgree(setup.GetSource(i)));
+  }
   for (int i = 0; i < setup.CountDestinations(); ++i) {
-    Destination const each = setup.GetDestination(i);
-    ASSERT_TRUE(each.Exists());
-    for (int k = 0; k < each.CountConnectedDestinations(); ++k) {
-      ASSERT_EQ(each.GetConnectedDestination(k).GetDirectDestination(), each);
+    ASSERT_NO_FATAL_FAILURE(ExpectEndsAgree(setup.GetDestination(i)));
+  }
+  ASSERT_NO_FATAL_FAILURE(ExpectListsAgree(setup));
+}
+
+/// One port of each way in and out.
+std::vector<SimulatedPort> PortsOfEachKind() {
+  std::vector<SimulatedPort> ports(5);
+  ports[0].name = "Out";
+  ports[1].name = "In";
+  ports[1].kind = Kind::kWinMMIn;
+  ports[2].name = "Native";
+  ports[2].kind = Kind::kDirectMusicOut;
+  ports[2].external = true;
+  ports[3].name = "Native In";
+  ports[3].kind = Kind::kDirectMusicIn;
+  ports[3].external = true;
+  ports[4].name = "Synth";
+  ports[4].kind = Kind::kDirectMusicOut;
+  ports[4].dls = true;
+  return ports;
+}
+
+// Fails the first, the second, ... call of the system while all ports go and come back. Whatever is
+// missed by that, comes with the next list of ports.
+TEST_F(Reconciliation, SurvivesAFailureOfEachCallOfTheSystem) {
+  std::vector<SimulatedPort> const ports = PortsOfEachKind();
+  std::uint64_t calls = 0;
+  for (std::uint64_t nth = 0; nth <= calls; ++nth) {
+    SCOPED_TRACE(nth);
+    // A device that the system refuses to close stays open for good: a system of its own for each.
+    SimulatedMIDI other;
+    other.SetCollection({0, 1});
+    other.Install();
+    SignIn();
+    other.ResetCalls();
+    if (nth > 0) {
+      other.Fail("*", nth);
     }
-    Destination const port = each.GetDirectDestination();
-    if (port.Exists()) {
-      bool isListed = false;
-      for (int k = 0; k < port.CountConnectedDestinations(); ++k) {
-        isListed = isListed || port.GetConnectedDestination(k) == each;
-      }
-      ASSERT_TRUE(isListed);
+    for (SimulatedPort const& port : ports) {
+      other.AddPort(port);
     }
-    if (each.IsDirect() && !each.IsVirtual()) {
-      auto const& impl =
-          *static_cast<Impl::EndpointImpl*>(static_cast<Impl::ObjectImpl*>(each.GetImplPtr()));
-      auto const* const peer = Impl::WinMIDIPort::Of(impl);
-      ASSERT_EQ(each.IsOnline(), peer->GetActiveImpl() != nullptr);
+    Rescan();
+    for (SimulatedPort const& port : ports) {
+      other.RemovePort(port.name);
+    }
+    Rescan();
+    for (SimulatedPort const& port : ports) {
+      other.AddPort(port);
+    }
+    Rescan();
+    calls = nth == 0 ? other.CountCalls() : calls;
+    ASSERT_GT(calls, 200u);
+    other.ClearFaults();
+    Rescan();
+    ExpectWhole(setup);
+    EXPECT_THAT(DestNames(), UnorderedElementsAre("Out", "Native", "Synth"));
+    EXPECT_THAT(SourceNames(), UnorderedElementsAre("In", "Native In"));
+    for (int i = 0; i < setup.CountDestinations(); ++i) {
+      EXPECT_TRUE(setup.GetDestination(i).IsOnline());
+    }
+    for (int i = 0; i < setup.CountSources(); ++i) {
+      EXPECT_TRUE(setup.GetSource(i).IsOnline());
+    }
+    SignOut();
+    if (HasFatalFailure()) {
+      break;
     }
   }
-  for (int i = 0; i < setup.CountEntities(); ++i) {
-    ASSERT_TRUE(setup.GetEntity(i).GetDevice().Exists());
-  }
+  midi.Install();
 }
 
 TEST_F(Reconciliation, AStormOfPlugsLeavesTheStudioWhole) {
@@ -347,9 +506,10 @@ TEST_F(Reconciliation, AStormOfPlugsLeavesTheStudioWhole) {
       default:
         if (setup.CountDevices() > 4) {
           setup.DeleteDevice(setup.GetDevice(0));
-        } else if (setup.CountDevices() > 0 && setup.CountDestinations() > 0) {
-          setup.GetDestination(0).AddConnectedDestination(
-              setup.GetDevice(0).GetEntity(0).GetDestination(0));
+        } else if (setup.CountDevices() > 0) {
+          Entity const entity = setup.GetDevice(0).GetEntity(0);
+          setup.GetDestination(0).AddConnectedDestination(entity.GetDestination(0));
+          setup.GetSource(0).AddConnectedSource(entity.GetSource(0));
         }
     }
     if (below(3) != 0) {

@@ -248,6 +248,27 @@ TEST_F(LegacySender, WaitsUntilTheDriverLetsGoOfALongMessage) {
   EXPECT_THAT(SentTo("Out"), ElementsAre(Sysex(10)));
 }
 
+TEST_F(LegacySender, ADriverThatNeverLetsGoOfALongMessageIsReset) {
+  constexpr int kForEver = 1000000;
+  midi.HoldLongMessages(kForEver);
+  Send(out, Sysex(10));
+  std::vector<std::string> const calls =
+      Names(Log({"midiOutLongMsg", "midiOutUnprepareHeader", "midiOutReset"}));
+  EXPECT_EQ(calls.front(), "midiOutLongMsg");
+  EXPECT_THAT(std::vector<std::string>(calls.end() - 2, calls.end()),
+              ElementsAre("midiOutReset", "midiOutUnprepareHeader"));
+}
+
+TEST_F(LegacySender, AClockThatFailsHoldsNothingBack) {
+  midi.FailFrom("GetTime");
+  Send(out, {0x90, 1, 1}, kStart + 1000);
+  EXPECT_THAT(SentTo("Out"), ElementsAre(Bytes{0x90, 1, 1}));
+  midi.ClearFaults();
+  Send(out, {0x90, 2, 1}, kStart + 1000);
+  midi.Settle();
+  EXPECT_EQ(SentTo("Out").size(), 1u);
+}
+
 TEST_F(LegacySender, ScheduledMessagesLeaveAtTheirExactClock) {
   Send(out, {0x90, 60, 64}, kStart + 1000);
   Send(out, {0x80, 60, 64}, kStart + 2500);
@@ -281,6 +302,14 @@ TEST_F(LegacySender, AStampInThePastLeavesAtOnce) {
   Send(out, {0x90, 1, 1}, kStart - 1);
   Send(out, {0x90, 2, 1}, kStart);
   EXPECT_THAT(TimesLeft("Out"), ElementsAre(0, 0));
+}
+
+TEST_F(LegacySender, AStampHalfTheRangeAheadWaits) {
+  Send(out, {0x90, 1, 1}, kStart + (1ull << 63));
+  midi.Settle();
+  EXPECT_THAT(SentTo("Out"), IsEmpty());
+  Send(out, {0x90, 2, 1}, kStart + (1ull << 63) + 1);  // nearer backwards: in the past
+  EXPECT_THAT(SentTo("Out"), ElementsAre(Bytes{0x90, 2, 1}));
 }
 
 TEST_F(LegacySender, AFullQueueLosesTheNewest) {

@@ -159,6 +159,30 @@ TEST_F(SignIn, SignOutEmptiesTheStudioAndKeepsItsName) {
   EXPECT_EQ(setup.SignInName(), UString("Test"));
 }
 
+// Ports that the sign-in found count as a change: hosts that draw the studio after their first poll
+// rely on it.
+TEST_F(SignIn, TheFirstPollTellsOfTheStudioOnceMore) {
+  AddOut("Out");
+  PlatformTest::SignIn();
+  EXPECT_EQ(listener.setupChanges, 1);
+  setup.PollSetupChanges();
+  EXPECT_EQ(listener.setupChanges, 2);
+  setup.PollSetupChanges();
+  EXPECT_EQ(listener.setupChanges, 2);
+}
+
+TEST_F(SignIn, SignOutDropsAListOfPortsThatWaits) {
+  PlatformTest::SignIn();
+  AddOut("Out");
+  ListPorts();
+  midi.RemovePort("Out");
+  SignOut();
+  PlatformTest::SignIn();
+  EXPECT_FALSE(setup.HasListedPorts());
+  setup.PollSetupChanges();
+  EXPECT_THAT(DestNames(), IsEmpty());
+}
+
 TEST_F(SignIn, PollsAndSignOutsWhileSignedOutAreHarmless) {
   SignOut(true);
   setup.Poll();

@@ -2,6 +2,7 @@
 
 #include "platform/ports/LegacyOutDevice.h"
 
+#include <algorithm>
 #include <chrono>
 #include <cstring>
 #include <limits>
@@ -31,6 +32,9 @@ class CountedIn {
   std::atomic<int>& count_;
 };
 
+/// The longest wait, of 14,000 years: added to any time of the clock it stays within 64 bits.
+constexpr long long kForEver = std::numeric_limits<long long>::max() / 2;
+
 /// How much later than now the stamp is, in clocks; 0 when it has come or cannot be told.
 long long ClocksUntil(TimeStamp const& stamp) {
   unsigned long long const due = stamp.AsMIDITime().Value();
@@ -39,7 +43,7 @@ long long ClocksUntil(TimeStamp const& stamp) {
   }
   try {
     auto const late = static_cast<long long>(CurrentMIDITime().Value() - due);
-    return late < 0 ? -late : 0;
+    return late < 0 ? -std::max(late, -kForEver) : 0;
   } catch (VantorError const&) {
     return 0;  // a clock that fails must not hold output back
   }

@@ -15,6 +15,28 @@ void HandOver(DataPacket const& packet, Receiver* receiver, Source const& source
   }
 }
 
+/// Reads until nothing is left or the port is closed, which the receiver may do. False when the
+/// driver never ran dry.
+bool DrainBuffers(DMusLine const& line, IDirectMusicBuffer& buffer, Receiver* receiver,
+                  Source const& source) {
+  buffer.Flush();
+  for (int round = 0; line.isOpen && line.port->Read(&buffer) == S_OK; ++round) {
+    if (round == kMostBuffersADrain) {
+      return false;
+    }
+    buffer.ResetReadPtr();
+    REFERENCE_TIME time = 0;
+    DWORD length = 0;
+    BYTE* data = nullptr;
+    while (line.isOpen && buffer.GetNextEvent(&time, nullptr, &length, &data) == S_OK) {
+      HandOver({data, length, TimeStamp(Clocks(static_cast<unsigned long long>(time)))}, receiver,
+               source);
+    }
+    buffer.Flush();
+  }
+  return true;
+}
+
 }  // namespace
 
 WinDMusMIDIInPort::~WinDMusMIDIInPort() { CloseEvent(); }
@@ -40,38 +62,22 @@ void WinDMusMIDIInPort::CloseEvent() {
 }
 
 void WinDMusMIDIInPort::DrainInput(Receiver* receiver, Source const& source) {
-  Waits& waits = GetSession()->GetWaits();
   if (Port() == nullptr || notification_ == nullptr ||
-      waits.WaitForSingleObject(notification_, 0) != WAIT_OBJECT_0) {
+      GetSession()->GetWaits().WaitForSingleObject(notification_, 0) != WAIT_OBJECT_0) {
     return;
   }
-  // The receiver may take this port out of the studio while it is being drained.
+  // The receiver may take this port out of the studio, and with it this object: what the drain
+  // still needs then is held here.
   std::shared_ptr<DMusLine> const line = Line();
+  HANDLE const notification = notification_;
   try {
-    BufferPool::Loan const loan = BufferPool::Borrow(GetSession()->Pool());
-    DrainBuffers(*loan->buffer.get(), receiver, source);
+    BufferPool::Loan const loan = BufferPool::Borrow(line->session->Pool());
+    bool const isDry = DrainBuffers(*line, *loan->buffer.get(), receiver, source);
+    if (!isDry && line->isOpen) {
+      line->session->GetWaits().SetEvent(notification);
+    }
   } catch (...) {
     // The host hears of its own failure where it happened; the poll goes on.
-  }
-}
-
-void WinDMusMIDIInPort::DrainBuffers(IDirectMusicBuffer& buffer, Receiver* receiver,
-                                     Source const& source) {
-  buffer.Flush();
-  for (int round = 0; Port() != nullptr && Port()->Read(&buffer) == S_OK; ++round) {
-    if (round == kMostBuffersADrain) {
-      GetSession()->GetWaits().SetEvent(notification_);
-      return;
-    }
-    buffer.ResetReadPtr();
-    REFERENCE_TIME time = 0;
-    DWORD length = 0;
-    BYTE* data = nullptr;
-    while (buffer.GetNextEvent(&time, nullptr, &length, &data) == S_OK) {
-      HandOver({data, length, TimeStamp(Clocks(static_cast<unsigned long long>(time)))}, receiver,
-               source);
-    }
-    buffer.Flush();
   }
 }
 

@@ -19,7 +19,6 @@ class WinDMusMIDIInPort : public WinDMusMIDIPort {
   void DrainInput(Receiver* receiver, Source const& source);
 
  private:
-  void DrainBuffers(IDirectMusicBuffer& buffer, Receiver* receiver, Source const& source);
   void CloseEvent();
 
   HANDLE notification_ = nullptr;

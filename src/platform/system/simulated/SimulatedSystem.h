@@ -13,7 +13,7 @@ namespace Ostinet::Impl::Simulated {
 /// The seam's operations over a simulated studio.
 ///
 /// Threads  Any.
-class SimulatedSystem final : public System {
+class SimulatedSystem : public System {
  public:
   SimulatedSystem() : studio_(std::make_shared<Studio>()) {}
 
