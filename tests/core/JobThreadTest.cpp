@@ -15,7 +15,7 @@ namespace {
 constexpr unsigned int kPatience = 60'000;  // milliseconds; a wait that ends sooner or fails
 
 template <class T>
-VantorError ErrorOf(VantorFuture<T> const& future) {
+VantorError AwaitedErrorOf(VantorFuture<T> const& future) {
   try {
     future.Try(kPatience);
   } catch (VantorError const& error) {
@@ -69,8 +69,8 @@ TEST(JobThreads, PassErrorsToTheFutureAndGoOn) {
   thread.Start();
   auto const failing = thread.Post<int>([]() -> int { throw VantorError(7); });
   auto const odd = thread.Post<int>([]() -> int { throw std::runtime_error("no luck"); });
-  EXPECT_EQ(ErrorOf(*failing).Code(), 7);
-  EXPECT_EQ(ErrorOf(*odd).Text(), "no luck");
+  EXPECT_EQ(AwaitedErrorOf(*failing).Code(), 7);
+  EXPECT_EQ(AwaitedErrorOf(*odd).Text(), "no luck");
   EXPECT_EQ(thread.Post<int>([] { return 1; })->Try(kPatience), 1);
 }
 
@@ -99,7 +99,7 @@ TEST(JobThreads, FinishTheRunningJobAndCancelTheOthersAtTheEnd) {
   thread.Start();
   started.wait();
   std::thread ender([&thread] { thread.Terminate(); });
-  VantorError const error = ErrorOf(*waiting);
+  VantorError const error = AwaitedErrorOf(*waiting);
   goOn.count_down();
   ender.join();
   EXPECT_EQ(error.Component(), "VantorJobQueue");
@@ -116,7 +116,7 @@ TEST(JobThreads, RefuseWorkOnceTerminated) {
   EXPECT_TRUE(thread.IsTerminated());
   auto const future = thread.Post<int>([] { return 1; });
   ASSERT_TRUE(future->IsComplete());
-  VantorError const error = ErrorOf(*future);
+  VantorError const error = AwaitedErrorOf(*future);
   EXPECT_EQ(error.Domain(), "VantorThreads");
   EXPECT_EQ(error.Component(), "VantorJobThread");
   EXPECT_EQ(error.Text(), "Thread terminated");
@@ -127,7 +127,7 @@ TEST(JobThreads, AreNotStartedOnceTerminated) {
   auto const future = thread.Post<int>([] { return 1; });
   thread.Terminate();
   thread.Start();
-  EXPECT_EQ(ErrorOf(*future).Text(), "Job cancelled");
+  EXPECT_EQ(AwaitedErrorOf(*future).Text(), "Job cancelled");
 }
 
 TEST(JobThreads, MayBeTerminatedByAJobOfTheirOwn) {

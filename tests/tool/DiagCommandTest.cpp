@@ -11,10 +11,10 @@ using testing::IsEmpty;
 
 class DiagCommand : public ToolTest {
  protected:
-  json ReportOn(std::string const& studio) {
+  json ReportOn(std::string const& studio, testing::Matcher<std::string> const& notice = "") {
     ToolRun const run = RunOn(studio, {"diag", "--json"});
     EXPECT_EQ(run.exitCode, kDone) << run.err;
-    EXPECT_EQ(run.err, "");
+    EXPECT_THAT(run.err, notice);
     return json::parse(run.out);
   }
   /// The one of a list whose `key` is this text.
@@ -103,7 +103,7 @@ TEST_F(DiagCommand, NamesPortsThatAreGone) {
 TEST_F(DiagCommand, TellsOfABrokenSetupFileAndGoesOn) {
   ASSERT_EQ(RunOn(kThreePorts, {"device", "new", "Synth"}).exitCode, kDone);
   WriteFile("settings/Ostinet.xml", "<Setup>\n<Device");
-  json const report = ReportOn(kThreePorts);
+  json const report = ReportOn(kThreePorts, HasSubstr("cannot be read to its end"));
   EXPECT_THAT(Named(report["settings"]["files"], "Ostinet.xml")["fault"].get<std::string>(),
               HasSubstr("line 2"));
   ASSERT_EQ(report["errors"].size(), 1u);
@@ -117,6 +117,9 @@ TEST_F(DiagCommand, TellsOfABrokenDocument) {
 <CustomDeviceMode Name="Default"><ChannelNameSetAssignments/></CustomDeviceMode>
 </MasterDeviceNames></MIDINameDocument>)");
   ASSERT_EQ(RunOn(kThreePorts, {"device", "new", "Synth"}).exitCode, kDone);
+  ASSERT_EQ(RunOn(kThreePorts, {"device", "set", "Synth", "manufacturer", "Maker"}).exitCode,
+            kDone);
+  ASSERT_EQ(RunOn(kThreePorts, {"device", "set", "Synth", "model", "Box"}).exitCode, kDone);
   ASSERT_EQ(RunOn(kThreePorts, {"names", "Synth", "--set", document}).exitCode, kDone);
   WriteFile("box.midnam", "<MIDINameDocument>");
   json const report = ReportOn(kThreePorts);

@@ -1,4 +1,5 @@
 // SPDX-License-Identifier: MIT
+#include "platform/system/simulated/LongHeader.h"
 #include "platform/system/simulated/OpenInput.h"
 #include "platform/system/simulated/SimulatedSystem.h"
 #include "platform/system/simulated/WideText.h"
@@ -27,10 +28,6 @@ MMRESULT OnOpenInput(Studio& studio, Op op, HMIDIIN handle, CallBook::Arguments 
   }
   studio.Book().Log(op, result, arguments, name);
   return result;
-}
-
-bool IsHeader(MIDIHDR const* header, UINT size) {
-  return header != nullptr && header->lpData != nullptr && size >= sizeof(MIDIHDR);
 }
 
 }  // namespace

@@ -1,4 +1,5 @@
 // SPDX-License-Identifier: MIT
+#include "platform/system/simulated/LongHeader.h"
 #include "platform/system/simulated/OpenOutput.h"
 #include "platform/system/simulated/SimulatedSystem.h"
 #include "platform/system/simulated/WideText.h"
@@ -32,10 +33,6 @@ MMRESULT OnOpenOutput(Studio& studio, Op op, HMIDIOUT handle, CallBook::Argument
   }
   studio.Book().Log(op, result, arguments, name);
   return result;
-}
-
-bool IsHeader(MIDIHDR const* header, UINT size) {
-  return header != nullptr && header->lpData != nullptr && size >= sizeof(MIDIHDR);
 }
 
 void Finish(MIDIHDR& header) { header.dwFlags = (header.dwFlags & ~MHDR_INQUEUE) | MHDR_DONE; }
