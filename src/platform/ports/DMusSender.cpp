@@ -83,8 +83,8 @@ class DMusSender::Packer {
   DWORD const max_;
 };
 
-DMusSender::DMusSender(RCPtrMT<ChannelPatchState> tracker, std::shared_ptr<DMusLine> line)
-    : TrackingSender(std::move(tracker)), line_(std::move(line)) {
+DMusSender::DMusSender(RCPtrMT<ChannelPatchState> const& tracker, std::shared_ptr<DMusLine> line)
+    : TrackingSender(tracker), line_(std::move(line)) {
   if (!line_) {
     return;
   }

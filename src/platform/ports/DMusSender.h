@@ -10,7 +10,7 @@ namespace Ostinet::Impl {
 class DMusSender : public TrackingSender {
  public:
   /// `line` may be null: the port is closed.
-  DMusSender(RCPtrMT<ChannelPatchState> tracker, std::shared_ptr<DMusLine> line);
+  DMusSender(RCPtrMT<ChannelPatchState> const& tracker, std::shared_ptr<DMusLine> line);
 
   ~DMusSender() override;
 

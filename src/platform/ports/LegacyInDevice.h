@@ -37,7 +37,7 @@ class LegacyInDevice : public std::enable_shared_from_this<LegacyInDevice> {
  private:
   struct Target {
     Source source;
-    Receiver* receiver;  // the host's
+    Receiver* receiver = nullptr;  // the host's
   };
 
   static void CALLBACK OnMessage(HMIDIIN handle, UINT message, DWORD_PTR instance,

@@ -34,8 +34,8 @@ class NowhereSender : public TrackingSender {
 
 class LegacySender : public TrackingSender {
  public:
-  LegacySender(RCPtrMT<ChannelPatchState> tracker, std::shared_ptr<LegacyOutDevice> device)
-      : TrackingSender(std::move(tracker)), device_(std::move(device)) {}
+  LegacySender(RCPtrMT<ChannelPatchState> const& tracker, std::shared_ptr<LegacyOutDevice> device)
+      : TrackingSender(tracker), device_(std::move(device)) {}
   void Flush() override {}
   bool CanSend() const override { return device_->IsOpen(); }
 
@@ -48,8 +48,8 @@ class LegacySender : public TrackingSender {
 
 class VirtualSender : public TrackingSender {
  public:
-  VirtualSender(RCPtrMT<ChannelPatchState> tracker, std::shared_ptr<PacketQueue> queue)
-      : TrackingSender(std::move(tracker)), queue_(std::move(queue)) {}
+  VirtualSender(RCPtrMT<ChannelPatchState> const& tracker, std::shared_ptr<PacketQueue> queue)
+      : TrackingSender(tracker), queue_(std::move(queue)) {}
   void Flush() override {}
   bool CanSend() const override { return true; }
 

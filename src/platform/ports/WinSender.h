@@ -20,7 +20,7 @@ std::unique_ptr<Sender> MakeWinSender(DeviceObjectImpl* object);
 /// Base of the three ways out: follows the program changes that pass.
 class TrackingSender : public Sender {
  public:
-  explicit TrackingSender(RCPtrMT<ChannelPatchState> tracker) : tracker_(std::move(tracker)) {}
+  explicit TrackingSender(RCPtrMT<ChannelPatchState> const& tracker) : tracker_(tracker) {}
 
   // Senders come and go with every single packet, so they live in a pool of blocks.
   static void* operator new(std::size_t size);

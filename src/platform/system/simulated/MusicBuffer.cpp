@@ -41,7 +41,7 @@ HRESULT MusicBuffer::Append(REFERENCE_TIME time, DWORD group, DWORD flags, std::
 
 bool MusicBuffer::Next(DWORD& offset, Event& event) {
   if (used_ < kHeader || offset > used_ - kHeader) return false;
-  DMUS_EVENTHEADER header;
+  DMUS_EVENTHEADER header{};
   std::memcpy(&header, bytes_.data() + offset, kHeader);
   // The host may have written this.
   if (header.cbEvent > used_ - kHeader - offset) return false;
