@@ -77,6 +77,9 @@ void EndpointImpl::WriteConnections() {
 }
 
 void EndpointImpl::SetConnections(std::vector<EndpointImpl*> const& endpoints) {
+  if (endpoints == connected_) {
+    return;  // as nearly always
+  }
   std::unordered_set<EndpointImpl*> const before(connected_.begin(), connected_.end());
   std::unordered_set<EndpointImpl*> const now(endpoints.begin(), endpoints.end());
   for (EndpointImpl* const removed : connected_) {

@@ -7,7 +7,8 @@
 // and a number without an endpoint waits. The endpoints are indexed by ID once a round, in list
 // order, so that a round over a large studio does not walk it once for every number.
 #include <algorithm>
-#include <unordered_map>
+#include <cstddef>
+#include <vector>
 
 #include "model/PropertyKeys.h"
 #include "model/SetupState.h"
@@ -27,45 +28,56 @@ class Round {
   explicit Round(List const& list) {
     for (RCPtrMT<T> const& endpoint : list) {
       if (!endpoint->IsDirect()) {
-        free_[endpoint->GetInt(Keys::kUniqueID, 0)].endpoints.push_back(endpoint);
+        places_.push_back({endpoint->GetInt(Keys::kUniqueID, 0), &endpoint});
       }
     }
+    std::stable_sort(places_.begin(), places_.end(),
+                     [](Place const& a, Place const& b) { return a.id < b.id; });
   }
 
   /// Ties to `port` what its property names and `claim` lets it have.
   template <class Claim>
   void Connect(T& port, Claim const& claim) {
-    std::vector<int> ids;
-    port.Peer()->GetIntList(Keys::kConnUniqueID, ids);
-    std::vector<Impl::EndpointImpl*> found;
-    for (int const id : ids) {
-      auto const place = free_.find(id);
-      T* const endpoint = place != free_.end() ? place->second.Take(claim) : nullptr;
-      if (endpoint != nullptr) {
-        found.push_back(endpoint);
+    ids_.clear();
+    port.Peer()->GetIntList(Keys::kConnUniqueID, ids_);
+    found_.clear();
+    for (int const id : ids_) {
+      if (T* const endpoint = Take(id, claim)) {
+        found_.push_back(endpoint);
       }
     }
-    port.SetConnections(found);
+    port.SetConnections(found_);
   }
 
  private:
-  struct Queue {
-    List endpoints;
-    std::size_t next = 0;  // what stands before it was claimed in this round
-
-    template <class Claim>
-    T* Take(Claim const& claim) {
-      while (next < endpoints.size()) {
-        RCPtrMT<T> const& endpoint = endpoints[next++];
-        if (claim(endpoint)) {
-          return endpoint.get();
-        }
-      }
-      return nullptr;
-    }
+  struct Place {
+    int id;
+    RCPtrMT<T> const* endpoint;
+    std::size_t taken = 0;  // of the first of an ID: how many of that ID were claimed in this round
   };
 
-  std::unordered_map<int, Queue> free_;  // by unique ID
+  template <class Claim>
+  T* Take(int id, Claim const& claim) {
+    auto const first =
+        std::lower_bound(places_.begin(), places_.end(), id,
+                         [](Place const& place, int wanted) { return place.id < wanted; });
+    std::size_t const left = static_cast<std::size_t>(places_.end() - first);
+    while (left > 0 && first->taken < left) {
+      Place const& place = first[static_cast<std::ptrdiff_t>(first->taken)];
+      if (place.id != id) {
+        break;
+      }
+      ++first->taken;
+      if (claim(*place.endpoint)) {
+        return place.endpoint->get();
+      }
+    }
+    return nullptr;
+  }
+
+  std::vector<Place> places_;  // by unique ID, and in list order
+  std::vector<int> ids_;
+  std::vector<Impl::EndpointImpl*> found_;
 };
 
 template <class T>
