@@ -12,6 +12,7 @@
 #include <vector>
 
 #include "BenchHost.h"
+#include "CacheFiller.h"
 #include "platform/PortAttacher.h"
 #include "platform/Reconciliation.h"
 
@@ -31,21 +32,6 @@ void Reconcile(BenchHost& host, std::shared_ptr<Impl::Session> const& session,
   Impl::PortAttacher attacher(host.setup, session);
   benchmark::DoNotOptimize(Impl::Reconcile(host.setup, attacher, ports));
 }
-
-/// Fills the caches with memory of its own.
-class CacheFiller {
- public:
-  void Fill() {
-    for (std::size_t i = 0; i < memory_.size(); i += kLine) {
-      ++memory_[i];
-    }
-    benchmark::DoNotOptimize(memory_.data());
-  }
-
- private:
-  static constexpr std::size_t kLine = 64;
-  std::vector<unsigned char> memory_ = std::vector<unsigned char>(64u << 20);
-};
 
 /// What lies between two changes: the host polls, so that nothing is pending, and works.
 void Rest(benchmark::State& state, BenchHost& host, CacheFiller& filler) {
