@@ -85,11 +85,11 @@ void ListDirectMusicPorts(System& system, std::vector<SystemPort>& ports) {
 }  // namespace
 
 std::vector<SystemPort> ListSystemPorts() {
-  std::shared_ptr<System> const system = Impl::CurrentSystem();
+  System& system = *Impl::CurrentSystem();
   std::vector<SystemPort> ports;
-  ListWinMMOutputs(*system, ports);
-  ListWinMMInputs(*system, ports);
-  ListDirectMusicPorts(*system, ports);
+  ListWinMMOutputs(system, ports);
+  ListWinMMInputs(system, ports);
+  ListDirectMusicPorts(system, ports);
   return ports;
 }
 
