@@ -27,7 +27,7 @@ struct Received {
 };
 
 /// Takes what the filter lets through and notes it.
-class TestReceiver : public Receiver {
+class TestReceiver final : public Receiver {
  public:
   bool WantsPacket(DataPacket const& packet, Source const&) override;
   void HandlePacket(DataPacket const& packet, Source const& source) override;
