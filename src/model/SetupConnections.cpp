@@ -51,8 +51,8 @@ class Round {
 
  private:
   struct Place {
-    int id;
-    RCPtrMT<T> const* endpoint;
+    int id = 0;
+    RCPtrMT<T> const* endpoint = nullptr;
     std::size_t taken = 0;  // of the first of an ID: how many of that ID were claimed in this round
   };
 
