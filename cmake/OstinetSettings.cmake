@@ -46,10 +46,9 @@ target_compile_options(ostinet_settings INTERFACE
   $<$<CXX_COMPILER_ID:Clang>:-Wthread-safety>
   # g++ 12 sees overlapping copies in the sum of a literal and a std::string, once it optimises.
   $<$<AND:$<CXX_COMPILER_ID:GNU>,$<VERSION_LESS:$<CXX_COMPILER_VERSION>,13>>:-Wno-restrict>
-  # Optimising, GCC 12 takes the small buffers of boost::function and std::optional for unset. Clang
-  # keeps its eye on what is really unset.
+  # Optimising, GCC 12 takes the small buffers of boost::function and std::optional for unset.
   $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>
-  $<$<CXX_COMPILER_ID:GNU>:-Wno-uninitialized>
+  $<$<AND:$<CXX_COMPILER_ID:GNU>,$<BOOL:${WIN32}>>:-Wno-uninitialized>
   # Nor does it know that the distance between two ends of a vector is never negative.
   $<$<AND:$<CXX_COMPILER_ID:GNU>,$<NOT:$<CONFIG:Debug>>>:-Wno-stringop-overread>
   $<$<AND:$<CXX_COMPILER_ID:GNU>,$<NOT:$<CONFIG:Debug>>>:-Wno-stringop-overflow>

@@ -5,7 +5,7 @@
 #include <cstddef>
 #include <unordered_map>
 
-#include "platform/WideText.h"
+#include "platform/system/WideText.h"
 
 namespace Ostinet::Impl {
 

@@ -3,8 +3,8 @@
 #include "platform/ports/WinLegacyMIDIInPort.h"
 
 #include "model/PropertyKeys.h"
-#include "platform/WideText.h"
 #include "platform/ports/LegacyAPI.h"
+#include "platform/system/WideText.h"
 
 namespace Ostinet::Impl {
 

@@ -4,8 +4,8 @@
 
 #include "datapath/SysexImpl.h"
 #include "model/PropertyKeys.h"
-#include "platform/WideText.h"
 #include "platform/ports/LegacyAPI.h"
+#include "platform/system/WideText.h"
 
 namespace Ostinet::Impl {
 

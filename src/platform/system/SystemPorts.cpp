@@ -4,24 +4,17 @@
 #include <memory>
 
 #include "platform/system/System.h"
+#include "platform/system/WideText.h"
 
 namespace Ostinet {
 
 namespace {
 
 using Impl::System;
+using Impl::TextOf;
 
 // A driver that lists ports without end must not hang the list.
 constexpr unsigned kMostSystemPorts = 65536;
-
-template <std::size_t N>
-UString NameInCaps(WCHAR const (&units)[N]) {
-  UString name;
-  for (std::size_t i = 0; i < N && units[i] != 0; ++i) {
-    name.push_back(static_cast<char16_t>(units[i]));
-  }
-  return name;
-}
 
 SystemPort PortOfWinMM(SystemPort::Kind kind, unsigned index, MMRESULT result) {
   SystemPort port;
@@ -38,7 +31,7 @@ void ListWinMMOutputs(System& system, std::vector<SystemPort>& ports) {
     MMRESULT const result = system.midiOutGetDevCapsW(device, &caps, sizeof caps);
     ports.push_back(PortOfWinMM(SystemPort::kWinMMOut, device, result));
     if (result == MMSYSERR_NOERROR) {
-      ports.back().name = NameInCaps(caps.szPname);
+      ports.back().name = TextOf(caps.szPname);
       ports.back().technology = caps.wTechnology;
     }
   }
@@ -51,7 +44,7 @@ void ListWinMMInputs(System& system, std::vector<SystemPort>& ports) {
     MMRESULT const result = system.midiInGetDevCapsW(device, &caps, sizeof caps);
     ports.push_back(PortOfWinMM(SystemPort::kWinMMIn, device, result));
     if (result == MMSYSERR_NOERROR) {
-      ports.back().name = NameInCaps(caps.szPname);
+      ports.back().name = TextOf(caps.szPname);
     }
   }
 }
@@ -76,7 +69,7 @@ void ListDirectMusicPorts(System& system, std::vector<SystemPort>& ports) {
     port.kind = caps.dwClass == DMUS_PC_INPUTCLASS ? SystemPort::kDirectMusicIn
                                                    : SystemPort::kDirectMusicOut;
     port.index = index;
-    port.name = NameInCaps(caps.wszDescription);
+    port.name = TextOf(caps.wszDescription);
     port.flags = caps.dwFlags;
     ports.push_back(port);
   }
@@ -85,11 +78,13 @@ void ListDirectMusicPorts(System& system, std::vector<SystemPort>& ports) {
 }  // namespace
 
 std::vector<SystemPort> ListSystemPorts() {
-  System& system = *Impl::CurrentSystem();
+  // Held while its ports are listed: another thread may put a different system in its place.
+  // NOLINTNEXTLINE(performance-unnecessary-copy-initialization)
+  std::shared_ptr<System> const system = Impl::CurrentSystem();
   std::vector<SystemPort> ports;
-  ListWinMMOutputs(system, ports);
-  ListWinMMInputs(system, ports);
-  ListDirectMusicPorts(system, ports);
+  ListWinMMOutputs(*system, ports);
+  ListWinMMInputs(*system, ports);
+  ListDirectMusicPorts(*system, ports);
   return ports;
 }
 
