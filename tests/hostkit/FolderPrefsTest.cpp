@@ -5,6 +5,7 @@
 #include <fstream>
 
 #include "ostinet/hostkit/FolderPrefs.h"
+#include "support/TemporaryPath.h"
 
 namespace Ostinet {
 namespace {
@@ -14,15 +15,6 @@ using Block = std::vector<unsigned char>;
 
 class Prefs : public testing::Test {
  protected:
-  Prefs() {
-    fs::remove_all(path_);
-    fs::create_directories(path_.parent_path());
-  }
-  ~Prefs() override {
-    std::error_code ignored;
-    fs::remove_all(path_, ignored);
-  }
-
   static Folder At(fs::path const& path) {
     return Folder(FileSpecification(UString(path.u16string())));
   }
@@ -33,10 +25,8 @@ class Prefs : public testing::Test {
     return block;
   }
 
-  fs::path path_ =
-      fs::absolute(fs::path(testing::TempDir())) /
-      (std::string("prefs-") + testing::UnitTest::GetInstance()->current_test_info()->name()) /
-      "settings";
+  Testing::TemporaryPath temporary_;
+  fs::path const path_ = temporary_.Path() / "settings";
 };
 
 TEST_F(Prefs, KeepBlocksBetweenTwoLives) {

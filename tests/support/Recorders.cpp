@@ -2,16 +2,8 @@
 #include "support/Recorders.h"
 
 #include <fstream>
-#include <random>
 
 namespace Ostinet::Testing {
-
-MemoryPrefs::MemoryPrefs() {
-  std::random_device random;
-  folder = std::filesystem::temp_directory_path() /
-           ("ostinet-test-" + std::to_string(random()) + std::to_string(random()));
-  std::filesystem::create_directories(folder);
-}
 
 UString SystemPath(UString const& path) {
   std::filesystem::path const separators = std::filesystem::path("/").make_preferred();
@@ -20,11 +12,6 @@ UString SystemPath(UString const& path) {
     written += path[i] == u'/' ? static_cast<char16_t>(separators.string()[0]) : path[i];
   }
   return written;
-}
-
-MemoryPrefs::~MemoryPrefs() {
-  std::error_code ignored;
-  std::filesystem::remove_all(folder, ignored);
 }
 
 UString MemoryPrefs::MakeFile(std::string const& name, std::string const& content) {

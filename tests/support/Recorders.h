@@ -13,6 +13,7 @@
 
 #include "ostinet/Setup.h"
 #include "support/Printers.h"
+#include "support/TemporaryPath.h"
 
 namespace Ostinet::Testing {
 
@@ -62,10 +63,9 @@ UString SystemPath(UString const& path);
 
 /// Keeps blocks in memory, and files in a folder of its own that goes with it.
 class MemoryPrefs : public PrefsHandler {
- public:
-  MemoryPrefs();
-  ~MemoryPrefs();
+  TemporaryPath temporary_;
 
+ public:
   void Save(int id, std::vector<unsigned char> const& bytes) override { blocks[id] = bytes; }
   void Load(int id, std::vector<unsigned char>& bytes) override {
     loads.push_back(id);
@@ -79,7 +79,7 @@ class MemoryPrefs : public PrefsHandler {
 
   std::map<int, std::vector<unsigned char>> blocks;
   std::vector<int> loads;
-  std::filesystem::path folder;
+  std::filesystem::path folder = temporary_.Path();
 };
 
 }  // namespace Ostinet::Testing

@@ -27,14 +27,6 @@ std::string Native(fs::path const& path) { return fs::absolute(path).make_prefer
 
 std::string ProgramText() { return Quoted(Native(OSTINET_TOOL)); }
 
-// A name of its own for each test: tests run side by side.
-fs::path FolderOfTest() {
-  auto const* const info = testing::UnitTest::GetInstance()->current_test_info();
-  std::string name = std::string("ostinet-") + info->test_suite_name() + "-" + info->name();
-  std::replace(name.begin(), name.end(), '/', '-');
-  return fs::path(testing::TempDir()) / name;
-}
-
 }  // namespace
 
 char const* const kCabledStudio = R"({
@@ -57,16 +49,6 @@ std::vector<json> ToolRun::JSONLines() const {
     objects.push_back(json::parse(line));
   }
   return objects;
-}
-
-ToolTest::ToolTest() : folder_(FolderOfTest().string()) {
-  fs::remove_all(folder_);
-  fs::create_directories(folder_);
-}
-
-ToolTest::~ToolTest() {
-  std::error_code ignored;
-  fs::remove_all(folder_, ignored);
 }
 
 ToolRun ToolTest::Run(std::vector<std::string> arguments) {
@@ -110,7 +92,7 @@ std::string ToolTest::WriteFile(std::string const& name, std::string const& cont
 }
 
 std::string ToolTest::PathOf(std::string const& name) const {
-  return Native(fs::path(folder_) / name);
+  return Native(folder_.Path() / name);
 }
 
 bool ToolTest::IsPOSIX() { return fs::path::preferred_separator == '/'; }

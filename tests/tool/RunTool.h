@@ -9,6 +9,8 @@
 #include <string>
 #include <vector>
 
+#include "support/TemporaryPath.h"
+
 namespace Ostinet::Tool {
 
 using nlohmann::json;
@@ -37,9 +39,6 @@ constexpr int kUsage = 2;
 /// settings and the machine's ports are never touched.
 class ToolTest : public testing::Test {
  protected:
-  ToolTest();
-  ~ToolTest() override;
-
   /// Runs with these arguments, which may hold blanks but no quotes, and with a settings folder.
   ToolRun Run(std::vector<std::string> arguments);
   /// The same, on the studio of this description.
@@ -56,7 +55,7 @@ class ToolTest : public testing::Test {
   static bool IsPOSIX();
 
  private:
-  std::string folder_;
+  Testing::TemporaryPath folder_;
 };
 
 /// A studio of the output "Out 1" with a cable to the input "In 1".

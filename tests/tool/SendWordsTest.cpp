@@ -6,6 +6,7 @@
 
 #include "Errors.h"
 #include "SendWords.h"
+#include "support/TemporaryPath.h"
 
 namespace Ostinet::Tool {
 namespace {
@@ -89,10 +90,13 @@ TEST(SendWords, RefusesTimesThatAreNone) {
 class SysexFiles : public testing::Test {
  protected:
   std::string Write(std::string const& name, std::string const& content) {
-    std::filesystem::path const path = std::filesystem::path(testing::TempDir()) / name;
+    std::filesystem::path const path = folder_.Path() / name;
     std::ofstream(path, std::ios::binary) << content;
     return path.string();
   }
+
+ private:
+  Testing::TemporaryPath folder_;
 };
 
 TEST_F(SysexFiles, AreSentMessageByMessage) {

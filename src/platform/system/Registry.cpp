@@ -51,7 +51,7 @@ std::shared_ptr<System> ChooseSystem(char const* studioFile) {
   return std::make_shared<Simulated::SimulatedSystem>();
 }
 
-std::shared_ptr<System> const& CurrentSystem() {
+std::shared_ptr<System> CurrentSystem() {
   Choice& choice = TheChoice();
   std::lock_guard lock(choice.mutex);
   if (choice.installed != nullptr) return choice.installed;

@@ -101,7 +101,7 @@ class System {
 
 /// The system in use, chosen at the first call: a studio file named by the environment variable
 /// OSTINET_STUDIO, else the machine's own MIDI, else an empty simulated one. Any thread.
-std::shared_ptr<System> const& CurrentSystem();
+std::shared_ptr<System> CurrentSystem();
 
 /// Installs another system, before the first Setup::Instance or while signed out; null returns to
 /// the automatic choice. Signed-in ports keep the system that they were opened on.

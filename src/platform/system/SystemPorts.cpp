@@ -78,8 +78,6 @@ void ListDirectMusicPorts(System& system, std::vector<SystemPort>& ports) {
 }  // namespace
 
 std::vector<SystemPort> ListSystemPorts() {
-  // Held while its ports are listed: another thread may put a different system in its place.
-  // NOLINTNEXTLINE(performance-unnecessary-copy-initialization)
   std::shared_ptr<System> const system = Impl::CurrentSystem();
   std::vector<SystemPort> ports;
   ListWinMMOutputs(*system, ports);
