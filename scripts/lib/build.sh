@@ -43,16 +43,17 @@ build() {
 }
 
 # run_tests PRESET [CTEST ARGUMENT...]: prints failures, reasons of skips and, last, the counts.
-# With OSTINET_SECOND_CHANCE set, a test that fails is run once more, and named if it passes then.
+# With OSTINET_SECOND_CHANCE set, a test that fails is run up to twice more, and named if it passes
+# then.
 run_tests() {
   local preset=$1 log="build/logs/$1-test.log" status=0
   shift
-  [[ -z ${OSTINET_SECOND_CHANCE:-} ]] || set -- --repeat until-pass:2 "$@"
+  [[ -z ${OSTINET_SECOND_CHANCE:-} ]] || set -- --repeat until-pass:3 "$@"
   # A test that fails shows its output; a skipped one tells its reason in the same place.
   "${run_with[@]}" ctest --preset "$preset" --parallel "$jobs" --no-tests=error --output-junit \
     "$tree/build/logs/$preset-test.xml" "$@" >"$log" 2>&1 </dev/null || status=$?
   ((status != 0)) ||
-    sed -n 's/.*Test *#[0-9]*: \([^ ]*\) .*\*\*\*.*/passed at the second try: \1/p' "$log"
+    sed -n '/\*\*\*Skipped/d; s/.*Test *#[0-9]*: \([^ ]*\) .*\*\*\*.*/failed at first: \1/p' "$log"
   python3 scripts/lib/test-summary.py "build/logs/$preset-test.xml" "$log" || status=1
   return "$status"
 }
