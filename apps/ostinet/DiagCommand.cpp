@@ -186,7 +186,7 @@ void Diagnose(GlobalOptions const& globals) {
 void AddDiagCommand(CLI::App& app, CommandLine& line) {
   CLI::App* const command =
       app.add_subcommand("diag", "Print a report of everything, to send to whoever gives support");
-  command->footer("It holds the names of ports, devices and files, and changes nothing.");
+  command->footer("It holds the names of ports, devices and files, and saves nothing.");
   command->callback([&line] { line.run = [&line] { Diagnose(line.options); }; });
 }
 

@@ -16,13 +16,16 @@ constexpr char kContent[] =
     "</ControlNameList><PatchBank Name='B'><PatchNameList Name='L'><Patch Number='1' Name='p'/>"
     "</PatchNameList></PatchBank></ChannelNameSet>";
 
+// A document of the content above for the devices that `owners` names.
+std::string TextFor(std::string const& owners) {
+  return "<MIDINameDocument><Author/><MasterDeviceNames>" + owners + kContent +
+         "</MasterDeviceNames></MIDINameDocument>";
+}
+
 TEST(NameDocument, IsReadForItsFirstMakerAndModel) {
   TemporaryFolder const folder;
-  NameDocument const document(
-      folder.Write("a.midnam",
-                   "<MIDINameDocument><Author/><MasterDeviceNames><Manufacturer>Any</Manufacturer>"
-                   "<Model>One</Model><Model>Two</Model>" +
-                       std::string(kContent) + "</MasterDeviceNames></MIDINameDocument>"));
+  NameDocument const document(folder.Write(
+      "a.midnam", TextFor("<Manufacturer>Any</Manufacturer><Model>One</Model><Model>Two</Model>")));
   EXPECT_TRUE(document.IsWhole());
   ASSERT_EQ(document.CountModes(), 1);
   EXPECT_EQ(document.GetMode(0).GetName(), UString("M"));
@@ -39,9 +42,7 @@ TEST(NameDocument, IsReadForItsFirstMakerAndModel) {
 
 TEST(NameDocument, IsReadForADeviceByItsNumber) {
   TemporaryFolder const folder;
-  NameDocument const document(folder.Write(
-      "a.midnam", "<MIDINameDocument><MasterDeviceNames><Device UniqueID='-4'/>" +
-                      std::string(kContent) + "</MasterDeviceNames></MIDINameDocument>"));
+  NameDocument const document(folder.Write("a.midnam", TextFor("<Device UniqueID='-4'/>")));
   EXPECT_EQ(document.CountModes(), 1);
 }
 
@@ -49,10 +50,7 @@ TEST(NameDocument, IsReadForADeviceByItsNumber) {
 TEST(NameDocument, LooksBehindADeviceWithoutANumber) {
   TemporaryFolder const folder;
   NameDocument const document(folder.Write(
-      "a.midnam",
-      "<MIDINameDocument><MasterDeviceNames><Device Name='x'/><Manufacturer>Any</Manufacturer>"
-      "<Model>One</Model>" +
-          std::string(kContent) + "</MasterDeviceNames></MIDINameDocument>"));
+      "a.midnam", TextFor("<Device Name='x'/><Manufacturer>Any</Manufacturer><Model>One</Model>")));
   EXPECT_EQ(document.CountModes(), 1);
 }
 

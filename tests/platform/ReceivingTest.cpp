@@ -23,6 +23,12 @@ Bytes CountingSysex(std::size_t size) {
   return bytes;
 }
 
+void ThrowAtNoteTwo(Bytes const& bytes) {
+  if (bytes[1] == 2) {
+    throw std::runtime_error("host");
+  }
+}
+
 class LegacyInput : public PlatformTest {
  protected:
   LegacyInput() {
@@ -113,11 +119,7 @@ TEST_F(LegacyInput, AReceiverThatThrowsLosesOnePacket) {
   for (unsigned char i = 1; i <= 3; ++i) {
     Arrive({0x90, i, 1});
   }
-  receiver.onPacket = [](Bytes const& bytes) {
-    if (bytes[1] == 2) {
-      throw std::runtime_error("host");
-    }
-  };
+  receiver.onPacket = ThrowAtNoteTwo;
   EXPECT_THROW(setup.ProcessInput(), std::runtime_error);
   setup.ProcessInput();
   EXPECT_EQ(receiver.AllBytes().back(), (Bytes{0x90, 3, 1}));
@@ -335,11 +337,7 @@ TEST_F(VirtualPair, AReceiverThatThrowsIsHeardAndLosesOnePacket) {
   for (unsigned char i = 1; i <= 3; ++i) {
     Send(destination, {0x90, i, 1});
   }
-  receiver.onPacket = [](Bytes const& bytes) {
-    if (bytes[1] == 2) {
-      throw std::runtime_error("host");
-    }
-  };
+  receiver.onPacket = ThrowAtNoteTwo;
   EXPECT_THROW(setup.ProcessInput(), std::runtime_error);
   setup.ProcessInput();
   EXPECT_EQ(receiver.AllBytes().back(), (Bytes{0x90, 3, 1}));
