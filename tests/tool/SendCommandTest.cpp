@@ -98,13 +98,15 @@ TEST_F(SendCommand, FailsForASysexFileThatCannotBeRead) {
 }
 
 // The message of an hour from now cannot have gone out.
+// In the foreground, timeout sends one interrupt and not two, of which the second would kill.
 TEST_F(SendCommand, FailsWhereItIsInterruptedBeforeTheEnd) {
   if (!IsPOSIX()) {
     GTEST_SKIP() << "needs a program that sends interrupts";
   }
   std::string const studio = WriteFile("studio.json", kCabledStudio);
   ToolRun const run = RunShell(
-      "timeout --preserve-status -s INT 5 PROGRAM send 'Out 1' F8 +3600000 FA --studio \"" +
+      "timeout --foreground --preserve-status -s INT 5 PROGRAM send 'Out 1' F8 +3600000 FA "
+      "--studio \"" +
       studio + "\" --settings \"" + PathOf("settings") + "\"");
   EXPECT_EQ(run.exitCode, kFailed);
   EXPECT_EQ(run.err, "ostinet: interrupted before all messages had gone out\n");
