@@ -57,7 +57,10 @@ std::string TypesText(FindingView const& finding) {
     bool const isLast = i + 1 == finding.types.size();
     bool const isNewMaker = i == 0 || finding.types[i - 1].first != maker;
     text += i == 0 ? "" : isLast ? " or " : ", ";
-    text += isNewMaker ? maker + " " + model : model;
+    if (isNewMaker) {
+      text.append(maker).append(" ");
+    }
+    text += model;
   }
   return text.empty() ? "an instrument of no known type, identity " + finding.identity : text;
 }

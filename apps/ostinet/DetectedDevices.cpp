@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: MIT
 #include "DetectedDevices.h"
 
+#include "DeviceProperties.h"
+
 namespace Ostinet::Tool {
 namespace {
 
@@ -10,8 +12,8 @@ bool IsRealID(int id) {
 
 // A device whose ID nobody stored may be any.
 bool IsDeviceOf(Device const& device, DetectionRun::Finding const& finding) {
-  int const id = device.GetSysexDeviceID();
-  bool const canBeID = id < 0 || !IsRealID(finding.deviceID) || id == finding.deviceID;
+  std::optional<int> const id = SysexDeviceIDOf(device);
+  bool const canBeID = !id || !IsRealID(finding.deviceID) || *id == finding.deviceID;
   return canBeID && finding.types.front().MatchesDevice(device);
 }
 

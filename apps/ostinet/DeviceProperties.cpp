@@ -114,8 +114,8 @@ struct ReadText {
     return mask == 0 || mask == 0xFFFF ? "all" : ChannelsText(mask);  // 0: nobody said
   }
   std::string operator()(DeviceIDKind const&) const {
-    int const id = static_cast<signed char>(object.GetSysexDeviceID());
-    return id < 0 ? "none" : std::to_string(id);
+    std::optional<int> const id = SysexDeviceIDOf(object);
+    return id ? std::to_string(*id) : "none";
   }
   std::string operator()(MicrosecondsKind const&) const {
     return std::to_string(object.GetAdvanceScheduleMicroseconds());
@@ -131,8 +131,8 @@ struct ReadJson {
     return mask == 0 ? 0xFFFF : mask;
   }
   Json operator()(DeviceIDKind const&) const {
-    int const id = static_cast<signed char>(object.GetSysexDeviceID());
-    return id < 0 ? Json() : Json(id);
+    std::optional<int> const id = SysexDeviceIDOf(object);
+    return id ? Json(*id) : Json();
   }
   Json operator()(MicrosecondsKind const&) const { return object.GetAdvanceScheduleMicroseconds(); }
 };
@@ -232,6 +232,12 @@ std::string PropertiesJSON(DeviceObject const& object) {
     json[ChannelKey(channel)] = object.GetChannelName(channel).string();
   }
   return JsonText(json);
+}
+
+// On some machines a plain char has no sign.
+std::optional<int> SysexDeviceIDOf(DeviceObject const& object) {
+  auto const id = static_cast<unsigned char>(object.GetSysexDeviceID());
+  return id < 0x80 ? std::optional<int>(id) : std::nullopt;
 }
 
 std::string PropertiesHelp() {

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -25,6 +26,9 @@ void WriteProperty(DeviceObject const& object, std::string const& key, std::stri
 
 /// All of them as one JSON object: texts, booleans, numbers, and masks of channels.
 std::string PropertiesJSON(DeviceObject const& object);
+
+/// The number in sysex messages, 0 to 127; none where nobody stored one.
+std::optional<int> SysexDeviceIDOf(DeviceObject const& object);
 
 /// A line for each key, for the help.
 std::string PropertiesHelp();
