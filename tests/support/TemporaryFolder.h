@@ -14,6 +14,8 @@ namespace Ostinet::Testing {
 /// A temporary path as the library's own classes see it.
 class TemporaryFolder : public TemporaryPath {
  public:
+  TemporaryFolder() {}  // not defaulted, so that one may be const
+
   Folder GetFolder() const { return Folder(FileSpecification(UString(Path().c_str()))); }
 
   /// A file of this content, with the folders on the way to it.
