@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "Session.h"
 
+#include <chrono>
 #include <filesystem>
 
 #include "Errors.h"
@@ -79,26 +80,49 @@ std::string FaultOf(File const& file) {
   }
 }
 
-// What a save must have changed: a new file took the place of the old one.
-class FileState {
+// Whether a save puts a new file in the place of the old one. The time of the old one tells, which
+// is set back before: in places files are dated to the second, and a program may save twice in one.
+class Replacement {
  public:
-  explicit FileState(File const& file) {
-    std::u16string const full = file.GetFullPath().utf16_str();
-    std::error_code error;
-    isThere_ = file.IsFile();
-    time_ = std::filesystem::last_write_time(std::filesystem::path(full), error);
-    if (isThere_) {
-      content_ = file.Read();
+  explicit Replacement(File const& file)
+      : path_(file.GetFullPath().utf16_str()), wasThere_(IsThere()), time_(Time()) {
+    SetTime(time_ - std::chrono::hours(1));
+    mark_ = Time();
+  }
+  Replacement(Replacement const&) = delete;
+  Replacement& operator=(Replacement const&) = delete;
+  // An old file that stays gets its time back.
+  ~Replacement() {
+    if (!IsDone()) {
+      SetTime(time_);
     }
   }
-  bool operator==(FileState const& other) const {
-    return isThere_ == other.isThere_ && time_ == other.time_ && content_ == other.content_;
-  }
+  bool IsDone() const { return IsThere() && (!wasThere_ || Time() != mark_); }
 
  private:
-  bool isThere_ = false;
-  std::filesystem::file_time_type time_{};
-  std::vector<unsigned char> content_;
+  using FileTime = std::filesystem::file_time_type;
+
+  bool IsThere() const {
+    std::error_code error;
+    return std::filesystem::is_regular_file(path_, error);
+  }
+  FileTime Time() const {
+    std::error_code error;
+    FileTime const time = std::filesystem::last_write_time(path_, error);
+    return error ? FileTime() : time;
+  }
+  // Without the right to do so the file's own time has to tell.
+  void SetTime(FileTime time) const {
+    std::error_code ignored;
+    if (wasThere_) {
+      std::filesystem::last_write_time(path_, time, ignored);
+    }
+  }
+
+  std::filesystem::path const path_;
+  bool const wasThere_;
+  FileTime const time_;
+  FileTime mark_;
 };
 
 void NotifyError(std::exception_ptr const& error) {
@@ -180,12 +204,12 @@ void Session::Save() {
   if (!damage_.empty()) {
     throw Failure("nothing is saved over a studio that cannot be read: mend or remove the file");
   }
-  FileState const before(FileInSettings(kStudioFile));
+  Replacement const replacement(FileInSettings(kStudioFile));
   GetSetup().SetListener(nullptr);
   GetSetup().SignOut(true);
   FailIfSettingsFailed();
   // The library saves without a word, so what it left behind has to tell.
-  if (before == FileState(FileInSettings(kStudioFile))) {
+  if (!replacement.IsDone()) {
     throw Failure("the studio could not be saved in \"" +
                   FileInSettings(kStudioFile).GetFullPath().string() + "\"; it is as it was");
   }
