@@ -11,7 +11,15 @@ namespace {
 
 using testing::HasSubstr;
 
-class Usage : public ToolTest {};
+class Usage : public ToolTest {
+ protected:
+  // In front of a command of the shell: with this variable.
+  static std::string Setting(std::string const& name, std::string const& value) {
+    return IsPOSIX() ? name + "=\"" + value + "\" " : "set \"" + name + "=" + value + "\"&& ";
+  }
+  // The variable that names the folder above the user's own settings.
+  static char const* SettingsVariable() { return IsPOSIX() ? "XDG_CONFIG_HOME" : "APPDATA"; }
+};
 
 TEST_F(Usage, HelpGoesToTheStandardOutput) {
   for (std::vector<std::string> const& arguments :
@@ -101,22 +109,17 @@ TEST_F(Usage, MakesTheSettingsFolderWithThoseAboveIt) {
 }
 
 TEST_F(Usage, GoesOnWithoutTheUsersOwnSettingsWhereTheyCannotBeKept) {
-  if (!IsPOSIX()) {
-    GTEST_SKIP() << "needs a folder that nobody can write to";
-  }
-  ToolRun const run = RunShell("XDG_CONFIG_HOME=/dev/null PROGRAM list --json --studio \"" +
-                               WriteFile("studio.json", kCabledStudio) + "\"");
+  ToolRun const run =
+      RunShell(Setting(SettingsVariable(), WriteFile("no folder", "")) +
+               "PROGRAM list --json --studio \"" + WriteFile("studio.json", kCabledStudio) + "\"");
   EXPECT_EQ(run.exitCode, kDone);
   EXPECT_EQ(json::parse(run.out)["sources"].size(), 1u);
   EXPECT_THAT(run.err, HasSubstr("going on without settings"));
 }
 
 TEST_F(Usage, KeepsTheUsersOwnSettingsInTheirPlace) {
-  if (!IsPOSIX()) {
-    GTEST_SKIP() << "sets a variable as a POSIX shell does";
-  }
   ToolRun const run =
-      RunShell("XDG_CONFIG_HOME=\"" + PathOf("config") + "\" PROGRAM list --studio \"" +
+      RunShell(Setting(SettingsVariable(), PathOf("config")) + "PROGRAM list --studio \"" +
                WriteFile("studio.json", kCabledStudio) + "\"");
   EXPECT_EQ(run.exitCode, kDone) << run.err;
   EXPECT_TRUE(std::filesystem::is_directory(PathOf("config") + "/ostinet"));
@@ -140,19 +143,16 @@ TEST_F(Usage, SaysOnceWhereTheMachineHasNoMIDI) {
 
 TEST_F(Usage, TheEnvironmentChoosesAStudioToo) {
   std::string const studio = WriteFile("studio.json", kCabledStudio);
-  std::string const set =
-      IsPOSIX() ? "OSTINET_STUDIO=\"" + studio + "\" " : "set \"OSTINET_STUDIO=" + studio + "\"&& ";
   std::string const list = "PROGRAM list --json --settings \"" + PathOf("settings") + "\"";
-  ToolRun const run = RunShell(set + list);
+  ToolRun const run = RunShell(Setting("OSTINET_STUDIO", studio) + list);
   ASSERT_EQ(run.exitCode, kDone) << run.err;
   EXPECT_EQ(json::parse(run.out)["sources"][0]["name"], "In 1");
 }
 
 TEST_F(Usage, ABadStudioOfTheEnvironmentFails) {
   std::string const studio = WriteFile("studio.json", "{");
-  std::string const set =
-      IsPOSIX() ? "OSTINET_STUDIO=\"" + studio + "\" " : "set \"OSTINET_STUDIO=" + studio + "\"&& ";
-  ToolRun const run = RunShell(set + "PROGRAM list --settings \"" + PathOf("settings") + "\"");
+  ToolRun const run = RunShell(Setting("OSTINET_STUDIO", studio) + "PROGRAM list --settings \"" +
+                               PathOf("settings") + "\"");
   EXPECT_EQ(run.exitCode, kFailed);
   EXPECT_EQ(std::count(run.err.begin(), run.err.end(), '\n'), 1) << run.err;
 }
